@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTRCB.h Qvz_MGTRCB.cpp)

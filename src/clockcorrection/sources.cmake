@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTRCC.h Qvz_MGTRCC.cpp)

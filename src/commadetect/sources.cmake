@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTRCD.h Qvz_MGTRCD.cpp)

@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTGeneralSetup.h Qvz_MGTGeneralSetup.cpp)

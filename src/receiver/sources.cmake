@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTRX.h Qvz_MGTRX.cpp)

@@ -1,0 +1,1 @@
+set(PAGE_SOURCES Qvz_MGTTransmitter.h Qvz_MGTTransmitter.cpp)

@@ -1,0 +1,31 @@
+#pragma once
+// Common base of the six setup pages, with the conversions they share.
+
+#include "Qvz_WizPage.h"
+
+class Qvz_MGTWizPage : public Qvz_WizPage {
+public:
+    explicit Qvz_MGTWizPage(Qvz_WizMain* main);
+    ~Qvz_MGTWizPage() override;
+
+    bool DoBatchPage() override { return true; }
+    bool CreateGuiDlg(QWidget* parent) override = 0;
+    Wg_WizardPage* GetGuiDlg() override = 0;
+
+    // Digits as a sized literal: radix 0 binary ("%d'b%s"), else hexadecimal
+    // ("%d'h%s" with four bits a digit).
+    static Port::StringBase GetSizedLiteral(const Port::StringBase& digits, int radix);
+    // The text after "'h" (radix 1) or "'b" (any other radix); value
+    // unchanged when it holds no such marker.
+    static Port::StringBase StripSizedLiteral(const Port::StringBase& value, int radix);
+    // True when mask holds no more '0' characters than seqLength says.
+    static bool ValidateSeqMask(const Port::StringBase& mask, const Port::StringBase& seqLength);
+    // Which encodings the block's PMA speed allows; true when the PMA speed is
+    // its attribute's default.
+    static bool GetGT10EncodingChoices(Qvz_Block* block, bool& allowNone, bool& allow8B10B,
+                                       bool& allow64B66B);
+
+protected:
+    // Shared step of every page's CreateGuiDlg once the controller exists (or not).
+    bool FinishGuiCreation(bool created);
+};
