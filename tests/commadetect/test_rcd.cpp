@@ -7,7 +7,15 @@
 #include <gtest/gtest.h>
 
 #include <memory>
+#include <ostream>
 #include <string>
+
+namespace Port {
+// Readable values in failure messages.
+void PrintTo(const StringBase& s, std::ostream* os) {
+    *os << '"' << s.str() << '"';
+}
+} // namespace Port
 
 namespace {
 
