@@ -60,24 +60,6 @@ struct PageOn {
 
 } // namespace
 
-TEST(CommaDetect, InitialFieldsBeforeAnyRead) {
-    Qvz_MGTRCD page(nullptr);
-    EXPECT_EQ(page.m_decPcommaDetect, 1);
-    EXPECT_EQ(page.m_decMcommaDetect, 1);
-    EXPECT_EQ(page.m_alignCommaMsb, 0);
-    EXPECT_EQ(page.m_decValidCommaOnly, 1);
-    EXPECT_EQ(page.m_turnOffComma, 0);
-    EXPECT_EQ(page.m_mcommaMode, 1);
-    EXPECT_EQ(page.m_pcommaMode, 1);
-    EXPECT_EQ(page.m_pcommaValue, "0000000000");
-    EXPECT_EQ(page.m_mcommaValue, "0000000000");
-    EXPECT_EQ(page.m_commaMask, "0000000000");
-    EXPECT_EQ(page.m_alignCommaWord, "1");
-    EXPECT_TRUE(page.m_isGT);
-    EXPECT_FALSE(page.m_isGT10 || page.m_isGT11 || page.m_isBatch);
-    EXPECT_EQ(page.GetGuiDlg(), nullptr);
-}
-
 TEST(CommaDetect, WithoutDataOrActiveBlockNothingHappens) {
     // No design data: the data error, for the read, the write and the batch step.
     Qvz_MGTWizMain main("w", false);
@@ -471,21 +453,6 @@ TEST(CommaDetect, WritePatternsInTheFamilyNotation) {
         for (const auto& a : p.block->GetAttributes())
             values += a->GetValue().str() + " ";
         EXPECT_EQ(values, c.values) << c.primitive << " " << c.existing;
-    }
-}
-
-TEST(CommaDetect, TurnedOffMaskIsAllZerosInTheFamilyWidth) {
-    for (const char* prim : {"GT_CUSTOM", "GT10_CUSTOM", "GT11_CUSTOM"}) {
-        PageOn p(prim);
-        p.Add("QVZX_ONLY_TURNOFF_COMMA", "TRUE");
-        p.Add("COMMA_10B_MASK", "10'h3FF");
-        ASSERT_TRUE(p.page->DoBatchPage());
-        EXPECT_EQ(p.Value("COMMA_10B_MASK"),
-                  std::string(prim) == "GT11_CUSTOM" ? "000" : "0000000000")
-            << prim;
-        // And it reads back as zeros.
-        ASSERT_TRUE(p.page->ReadWizData());
-        EXPECT_EQ(p.page->m_commaMask, std::string(prim) == "GT11_CUSTOM" ? "000" : "0000000000");
     }
 }
 

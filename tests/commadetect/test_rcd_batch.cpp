@@ -55,10 +55,6 @@ const BatchCase kCases[] = {
       {"MCOMMA_10B_VALUE", "1010000011"},
       {"COMMA_10B_MASK", "0000000000"}},
      {}},
-    {"gt.json",
-     {"DEC_VALID_COMMA_ONLY=FALSE", "QVZX_ONLY_TURNOFF_COMMA=TRUE"},
-     {{"DEC_VALID_COMMA_ONLY", "FALSE"}, {"COMMA_10B_MASK", "0000000000"}},
-     {}},
     // A hexadecimal literal on a binary family keeps its bits.
     {"gt.json",
      {"COMMA_10B_MASK=10'h0F8", "PCOMMA_10B_VALUE=10'h17C"},
