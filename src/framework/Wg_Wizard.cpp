@@ -6,7 +6,6 @@
 #include <QLabel>
 #include <QListWidget>
 #include <QPushButton>
-#include <QShowEvent>
 #include <QStackedWidget>
 #include <QStyle>
 #include <QVBoxLayout>
@@ -40,6 +39,7 @@ Wg_Wizard::Wg_Wizard(QWidget* parent) : QDialog(parent) {
     m_steps->setFrameShape(QFrame::StyledPanel);
     m_steps->setFixedWidth(230);
     m_steps->setWordWrap(true);
+    m_steps->setSpacing(3);
     body->addWidget(m_steps);
 
     auto* right = new QVBoxLayout;
@@ -192,19 +192,20 @@ int Wg_Wizard::prevEnabled(int from) const {
     return -1;
 }
 
-void Wg_Wizard::showEvent(QShowEvent* event) {
-    QDialog::showEvent(event);
-    if (m_current < 0 && !event->spontaneous()) {
+void Wg_Wizard::setVisible(bool visible) {
+    // Before the window appears, so that it is laid out for the first page.
+    if (visible && m_current < 0 && !m_busy) {
         const int first = nextEnabled(-1);
-        if (first < 0)
-            return;
-        m_busy = true;
-        if (isSummary(first))
-            enterSummary(first);
-        else
-            showPage(first);
-        m_busy = false;
+        if (first >= 0) {
+            m_busy = true;
+            if (isSummary(first))
+                enterSummary(first);
+            else
+                showPage(first);
+            m_busy = false;
+        }
     }
+    QDialog::setVisible(visible);
 }
 
 void Wg_Wizard::showPage(int index) {

@@ -56,6 +56,9 @@ public:
     Wg_WizardPage* currentPage() const { return page(m_current); }
     int currentIndex() const { return m_current; }
 
+    // Showing the dialog the first time shows its first enabled page.
+    void setVisible(bool visible) override;
+
 public slots:
     // The four buttons; each asks the current page first.
     void next();
@@ -69,9 +72,6 @@ public slots:
 signals:
     // A page has just been shown.
     void pageShown(int index);
-
-protected:
-    void showEvent(QShowEvent* event) override;
 
 private:
     struct Entry {
