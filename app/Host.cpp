@@ -4,6 +4,7 @@
 #include "Qvz_MGTWizMain.h"
 #include "Qvz_Summary.h"
 
+#include <QApplication>
 #include <QCommandLineParser>
 #include <QDir>
 #include <QFile>
@@ -332,8 +333,19 @@ int Run(const QStringList& args) {
         return InputError(error);
 
     const Qvz_RunMode mode = opt.batch ? Qvz_RunMode::Batch : Qvz_RunMode::Window;
-    Qvz_StderrSink sink;
-    wiz.SetMessageSink(&sink);
+    if (mode == Qvz_RunMode::Window && !qobject_cast<QApplication*>(QCoreApplication::instance()))
+        return UsageError("the wizard dialog needs a GUI application; use --batch");
+    // Batch runs tell the user on standard error, window runs in message
+    // boxes over the dialog; the report records both alike.
+    Qvz_StderrSink stderrSink;
+    Qvz_MessageBoxSink boxSink(&wiz);
+    Qvz_HelpWindow help(&wiz);
+    if (mode == Qvz_RunMode::Window) {
+        wiz.SetMessageSink(&boxSink);
+        wiz.SetHelpHandler(&help);
+    } else {
+        wiz.SetMessageSink(&stderrSink);
+    }
     wiz.SetRunMode(mode);
     int status = wiz.Run() == Qvz_RunCompleted ? kExitCompleted : kExitRefused;
 

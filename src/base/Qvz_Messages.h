@@ -4,7 +4,12 @@
 
 #include "Port_StringBase.h"
 
+#include <QPointer>
 #include <vector>
+
+class QDialog;
+class QTextBrowser;
+class Qvz_WizMain;
 
 struct Qvz_Message {
     Port::StringBase text;
@@ -25,6 +30,17 @@ public:
     void Show(const Qvz_Message& message) override;
 };
 
+// Window runs: a message box parented to the wizard dialog, critical when
+// the first flag is set. Falls back to standard error where no GUI exists.
+class Qvz_MessageBoxSink : public Qvz_MessageSink {
+public:
+    explicit Qvz_MessageBoxSink(const Qvz_WizMain* main) : m_pMain(main) {}
+    void Show(const Qvz_Message& message) override;
+
+private:
+    const Qvz_WizMain* m_pMain;
+};
+
 // Keeps the messages it is shown (tests).
 class Qvz_RecordingSink : public Qvz_MessageSink {
 public:
@@ -37,4 +53,23 @@ class Qvz_HelpHandler {
 public:
     virtual ~Qvz_HelpHandler() = default;
     virtual void Open(const Port::StringBase& key) = 0;
+};
+
+// Window runs: shows the help page of a key (":/help/<key>.html", shipped
+// with the library) in a window beside the wizard dialog. The window stays
+// open while the user goes on working.
+class Qvz_HelpWindow : public Qvz_HelpHandler {
+public:
+    explicit Qvz_HelpWindow(const Qvz_WizMain* main) : m_pMain(main) {}
+    ~Qvz_HelpWindow() override;
+    void Open(const Port::StringBase& key) override;
+
+    // The resource of a key's page, or "" when the library has none.
+    static QString PageOf(const Port::StringBase& key);
+    QDialog* Window() const;
+
+private:
+    const Qvz_WizMain* m_pMain;
+    QPointer<QDialog> m_window;
+    QTextBrowser* m_browser = nullptr;
 };

@@ -28,13 +28,18 @@ struct Qvz_Summary {
     QString primitive;
     QString type;
     QString dataWidth;
+    QString loc;  // placement of the active block, "" when unplaced
+    QString role; // its CHAN_BOND_MODE, "" when it has none
     std::vector<Port> ports;
     std::vector<Tie> ties;
-    std::vector<QString> bitMapped;   // pins wired bit by bit
-    std::vector<QString> internals;   // internal signals in use
-    std::vector<Copy> copies;         // bonded copies of the block
+    std::vector<QString> bitMapped; // pins wired bit by bit
+    std::vector<QString> internals; // internal signals in use
+    std::vector<Copy> copies;       // bonded copies of the block
 
     static Qvz_Summary Of(const Qvz_WizData& data);
     // Multi-line text; brief leaves out the per-pin lists.
     QString ToText(bool brief) const;
+    // The same, fully, as HTML for the summary page. finished false says the
+    // finish routine has not completed, so ports and copies may be missing.
+    QString ToHtml(bool finished) const;
 };

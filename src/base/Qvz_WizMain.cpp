@@ -1,10 +1,11 @@
 #include "Qvz_WizMain.h"
 
+#include "Qvz_Summary.h"
 #include "Qvz_WizPage.h"
+#include "Wg_SummaryPage.h"
 #include "Wg_Wizard.h"
 
 #include <QDialog>
-#include <QLabel>
 
 Qvz_WizMain::Qvz_WizMain(const Port::StringBase& name, bool flag) : m_name(name), m_flag(flag) {}
 
@@ -99,26 +100,48 @@ bool Qvz_WizMain::CreateGuiDlgs(Wg_Wizard* wizard) {
 
 bool Qvz_WizMain::BuildDialog(Wg_Wizard* wizard) {
     m_pWizard = wizard;
+    m_pSummaryPage = nullptr;
     CreateGuiDlgs(wizard);
     if (wizard) {
-        auto* summary = new Wg_WizardPage(wizard);
-        summary->setPageName("Summary");
-        summary->setPageWidget(new QLabel(wizard));
+        auto* summary = new Wg_SummaryPage(wizard);
         m_pSummaryPage = summary;
+        wizard->setSummaryPage(summary);
+        wizard->setEnterSummaryHook([this, summary] {
+            const bool ok = EnterSummary();
+            FillSummary(summary, ok);
+            return ok;
+        });
+        wizard->setLeaveSummaryHook([this] { LeaveSummary(); });
+        FillSummary(summary, false);
     }
-    return CustomizeGui(wizard);
+    const bool customized = CustomizeGui(wizard);
+    // A customization that does not place the summary still ends with it.
+    if (wizard && wizard->indexOf(m_pSummaryPage) < 0)
+        wizard->addPage(m_pSummaryPage);
+    return customized;
+}
+
+void Qvz_WizMain::FillSummary(Wg_SummaryPage* page, bool finished) const {
+    if (!page)
+        return;
+    const Qvz_Summary s = m_pWizData ? Qvz_Summary::Of(*m_pWizData) : Qvz_Summary();
+    QString text = s.ToText(false);
+    if (!finished)
+        text += "The ports, pins and bonded copies could not be completed.\n";
+    page->setSummary(s.ToHtml(finished), text);
 }
 
 int Qvz_WizMain::RunGuiMode() {
-    Wg_Wizard wizard;
-    BuildDialog(&wizard);
-    const int code = wizard.exec();
     int result = Qvz_RunRefused;
-    if (code == QDialog::Accepted)
-        result = Finish() == 0 ? Qvz_RunCompleted : Qvz_RunRefused;
-    // The controllers die with the dialog; the pages must not keep them.
-    m_pSummaryPage = nullptr;
-    m_pWizard = nullptr;
+    {
+        Wg_Wizard wizard;
+        BuildDialog(&wizard);
+        if (wizard.exec() == QDialog::Accepted)
+            result = Finish() == 0 ? Qvz_RunCompleted : Qvz_RunRefused;
+        // The controllers die with the dialog; nothing may reach them after.
+        m_pSummaryPage = nullptr;
+        m_pWizard = nullptr;
+    }
     DeletePages();
     return result;
 }

@@ -9,6 +9,7 @@
 #include <vector>
 
 class Qvz_WizPage;
+class Wg_SummaryPage;
 class Wg_Wizard;
 class Wg_WizardPage;
 
@@ -47,7 +48,8 @@ public:
     // takes the mode and target, and makes the pages afresh.
     void Prepare();
     // Window runs: has each page make its controller, adds the summary page
-    // and customizes the dialog. Returns what the customization answered.
+    // (filled when it is entered) with the summary hooks, and customizes the
+    // dialog. Returns what the customization answered.
     bool BuildDialog(Wg_Wizard* wizard);
     // Ends a run the way Finish does; returns its result.
     int FinishRun() { return Finish(); }
@@ -95,6 +97,9 @@ public:
     int m_maxBondGT11 = 0;
 
 private:
+    // Shows the design data's summary; finished false marks it incomplete.
+    void FillSummary(Wg_SummaryPage* page, bool finished) const;
+
     Port::StringBase m_name;
     bool m_flag = false;
     Qvz_WizData* m_pWizData = nullptr;
