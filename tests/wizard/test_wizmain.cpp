@@ -156,10 +156,12 @@ TEST(WizMain, FinishReturnsZeroInBothModes) {
     }
 }
 
-TEST(WizMain, BatchRunWithoutDataStillRunsEveryPage) {
+TEST(WizMain, BatchRunWithoutABlockIsRefusedByAPage) {
+    // Without an active block there is nothing to configure: a page refuses
+    // the run, cleanly and by name.
     Qvz_MGTWizMain wiz("w", false);
     Qvz_WizData d;
     wiz.SetWizData(&d);
-    EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
-    EXPECT_EQ(wiz.GetFailedPageTitle(), "");
+    EXPECT_EQ(wiz.Run(), Qvz_RunRefused);
+    EXPECT_NE(wiz.GetFailedPageTitle(), "");
 }
