@@ -1,5 +1,6 @@
 #include "Qvz_MGTRCC.h"
 #include "Qvz_MGTWizMain.h"
+#include "TestApp.h"
 #include "Wg_WizardPage.h"
 
 #include <QApplication>
@@ -15,11 +16,7 @@
 namespace {
 
 QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_clockcorrection";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 const char* const kSeqNames[8] = {"CLK_COR_SEQ_1_1", "CLK_COR_SEQ_1_2", "CLK_COR_SEQ_1_3",

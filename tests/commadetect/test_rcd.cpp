@@ -1,5 +1,6 @@
 #include "Qvz_MGTRCD.h"
 #include "Qvz_MGTWizMain.h"
+#include "TestApp.h"
 #include "Wg_WizardPage.h"
 
 #include <QApplication>
@@ -20,11 +21,7 @@ void PrintTo(const StringBase& s, std::ostream* os) {
 namespace {
 
 QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_commadetect";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 // One active block of a primitive, and the page on top of it.

@@ -4,6 +4,7 @@
 // Each step is posted before the previous one runs, so a step that opens a
 // nested loop (a message box) does not stop the next step from closing it.
 
+#include "TestApp.h"
 #include "Wg_Wizard.h"
 
 #include <QApplication>
@@ -64,11 +65,3 @@ private:
     std::size_t m_next = 0;
     bool m_timedOut = false;
 };
-
-inline QApplication& TestApp() {
-    static int argc = 1;
-    static char name[] = "velomux_test";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
-}

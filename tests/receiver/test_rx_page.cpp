@@ -1,5 +1,6 @@
 #include "Qvz_MGTRX.h"
 #include "Qvz_MGTWizMain.h"
+#include "TestApp.h"
 #include "Wg_WizardPage.h"
 
 #include <QApplication>
@@ -62,11 +63,7 @@ struct Fixture {
 };
 
 QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_receiver";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 const char* kThresholdMessage = "The value of RX_LOS_THRESHOLD must be at least as big as the "

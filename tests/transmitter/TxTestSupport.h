@@ -6,6 +6,7 @@
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTTransmitter.h"
 #include "Qvz_MGTWizMain.h"
+#include "TestApp.h"
 
 #include <QApplication>
 #include <QJsonArray>
@@ -20,11 +21,7 @@
 namespace txtest {
 
 inline QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_transmitter";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 inline QString Fixture(const char* name) {

@@ -1,4 +1,5 @@
 #include "Qvz_MGTWizMain.h"
+#include "TestApp.h"
 #include "Wg_Wizard.h"
 
 #include <QApplication>
@@ -7,11 +8,7 @@
 namespace {
 
 QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_wizard";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 Qvz_Block* AddBlock(Qvz_WizData& d, const char* name, const char* prim, const char* display,
@@ -43,10 +40,8 @@ TEST(GetBlkPrimName, GtNamesCarryTheirWidthExceptCustom) {
         const char* width;
         const char* expected;
     } cases[] = {
-        {"GT_CUSTOM", "2", "GT_CUSTOM"},
-        {"GT_FIBRE_CHAN", "2", "GT_FIBRE_CHAN_2"},
-        {"GT_ETHERNET", nullptr, "GT_ETHERNET_"},
-        {"GT10_CUSTOM", "4", "GT10_CUSTOM"},
+        {"GT_CUSTOM", "2", "GT_CUSTOM"},          {"GT_FIBRE_CHAN", "2", "GT_FIBRE_CHAN_2"},
+        {"GT_ETHERNET", nullptr, "GT_ETHERNET_"}, {"GT10_CUSTOM", "4", "GT10_CUSTOM"},
         {"GT11_CUSTOM", "4", "GT11_CUSTOM"},
     };
     for (const auto& c : cases) {

@@ -1,5 +1,6 @@
 #include "Qvz_MGTWizMain.h"
 #include "Qvz_MGTWizPage.h"
+#include "TestApp.h"
 
 #include <QApplication>
 #include <QComboBox>
@@ -25,15 +26,11 @@ TEST(SizedLiteral, StripsAfterTheFirstMarker) {
         int radix;
         const char* expected;
     } cases[] = {
-        {"4'b0101", 0, "0101"},
-        {"4'b0101", 1, "4'b0101"},
-        {"8'h1C", 1, "1C"},
-        {"8'h1C", 0, "8'h1C"},  // radix 0 looks for 'b only
-        {"8'h1C", 2, "8'h1C"},  // only radix 1 means hexadecimal
-        {"0101", 0, "0101"},
-        {"'b", 0, ""},
-        {"2'b01'b10", 0, "01'b10"},
-        {"", 1, ""},
+        {"4'b0101", 0, "0101"},     {"4'b0101", 1, "4'b0101"},
+        {"8'h1C", 1, "1C"},         {"8'h1C", 0, "8'h1C"}, // radix 0 looks for 'b only
+        {"8'h1C", 2, "8'h1C"},                             // only radix 1 means hexadecimal
+        {"0101", 0, "0101"},        {"'b", 0, ""},
+        {"2'b01'b10", 0, "01'b10"}, {"", 1, ""},
     };
     for (const auto& c : cases)
         EXPECT_EQ(Qvz_MGTWizPage::StripSizedLiteral(c.value, c.radix), c.expected) << c.value;
@@ -45,9 +42,10 @@ TEST(SeqMask, CountsZerosAgainstTheLength) {
         const char* len;
         bool ok;
     } cases[] = {
-        {"1111", "0", true}, {"0011", "1", false}, {"0011", "2", true}, {"0000", "4", true},
-        {"0000", "3", false}, {"", "0", true},     {"0x0y", "2", true}, {"00", "abc", false},
-        {"00", "-1", false},  {"0", "99999999999999", true},
+        {"1111", "0", true},           {"0011", "1", false}, {"0011", "2", true},
+        {"0000", "4", true},           {"0000", "3", false}, {"", "0", true},
+        {"0x0y", "2", true},           {"00", "abc", false}, {"00", "-1", false},
+        {"0", "99999999999999", true},
     };
     for (const auto& c : cases)
         EXPECT_EQ(Qvz_MGTWizPage::ValidateSeqMask(c.mask, c.len), c.ok) << c.mask << "/" << c.len;
@@ -110,11 +108,7 @@ TEST(EncodingChoices, FollowThePmaSpeedLists) {
 }
 
 TEST(ComboHelpers, SelectOnlyExactText) {
-    static int argc = 1;
-    static char name[] = "t";
-    static char* argv[] = {name, nullptr};
-    if (!QApplication::instance())
-        new QApplication(argc, argv);
+    TestApp();
     QComboBox combo;
     combo.addItems({"1", "2", "4", "Custom"});
     combo.setCurrentIndex(1);
