@@ -362,7 +362,10 @@ int Run(const QStringList& args) {
         Err() << "velomux-wizard: refused at page \"" << wiz.GetFailedPageTitle().ToQString()
               << "\"; nothing written.\n";
     else if (status == kExitRefused)
-        Err() << "velomux-wizard: cancelled; nothing written.\n";
+        Err() << (wiz.EndedIncomplete()
+                      ? "velomux-wizard: the ports, pins and bonded copies could not be completed; "
+                        "nothing written.\n"
+                      : "velomux-wizard: cancelled; nothing written.\n");
     if (status == kExitCompleted && !toStdout) {
         Out() << Qvz_Summary::Of(data).ToText(true);
         Out() << "Output:        " << (opt.output.isEmpty() ? QString("(none; use -o FILE)") : opt.output)

@@ -108,6 +108,7 @@ bool Qvz_WizMain::BuildDialog(Wg_Wizard* wizard) {
         wizard->setSummaryPage(summary);
         wizard->setEnterSummaryHook([this, summary] {
             const bool ok = EnterSummary();
+            m_summaryFinished = ok;
             FillSummary(summary, ok);
             return ok;
         });
@@ -136,8 +137,15 @@ int Qvz_WizMain::RunGuiMode() {
     {
         Wg_Wizard wizard;
         BuildDialog(&wizard);
-        if (wizard.exec() == QDialog::Accepted)
-            result = Finish() == 0 ? Qvz_RunCompleted : Qvz_RunRefused;
+        m_summaryFinished = false;
+        m_endedIncomplete = false;
+        if (wizard.exec() == QDialog::Accepted) {
+            // Finish on a summary whose finish routine failed would hand the
+            // host undecided pins as if they were done.
+            m_endedIncomplete = !m_summaryFinished;
+            if (!m_endedIncomplete)
+                result = Finish() == 0 ? Qvz_RunCompleted : Qvz_RunRefused;
+        }
         // The controllers die with the dialog; nothing may reach them after.
         m_pSummaryPage = nullptr;
         m_pWizard = nullptr;

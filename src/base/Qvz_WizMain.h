@@ -63,6 +63,9 @@ public:
     const std::vector<Qvz_Message>& GetMessages() const { return m_messages; }
     // Title of the page whose batch step refused, or "" when none did.
     const Port::StringBase& GetFailedPageTitle() const { return m_failedPage; }
+    // A window run ended by Finish while the summary's finish routine had
+    // failed: refused, since the design data is not complete.
+    bool EndedIncomplete() const { return m_endedIncomplete; }
 
     Qvz_WizPage* GetPage(int slot) const;
     Wg_Wizard* GetWizard() const { return m_pWizard; }
@@ -108,4 +111,6 @@ private:
     Qvz_HelpHandler* m_pHelp = nullptr;
     std::vector<Qvz_Message> m_messages;
     Port::StringBase m_failedPage;
+    bool m_summaryFinished = false;
+    bool m_endedIncomplete = false;
 };

@@ -189,10 +189,35 @@ TEST(WindowRun, FinishFromASetupPageWhoseSummaryFailsStaysOnTheSummary) {
         [] { Click("buttonFinish"); },
     });
     driver.Start();
-    EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
+    // Finish on a summary whose finish routine failed refuses the run: the
+    // design data would otherwise go out with undecided pins.
+    EXPECT_EQ(wiz.Run(), Qvz_RunRefused);
+    EXPECT_TRUE(wiz.EndedIncomplete());
     EXPECT_EQ(page, "Summary");
     EXPECT_TRUE(summary.contains("could not be completed")) << summary.toStdString();
     EXPECT_EQ(wiz.enters, 1);
+    EXPECT_EQ(wiz.finishes, 0);
+}
+
+TEST(WindowRun, ASummaryEnteredAgainSuccessfullyCanFinish) {
+    TestApp();
+    Qvz_WizData data;
+    MakeData(data);
+    TestMain wiz;
+    wiz.enterAnswer = false;
+    wiz.SetWizData(&data);
+    wiz.SetRunMode(Qvz_RunMode::Window);
+    DialogDriver driver({
+        [] { Click("buttonFinish"); },
+        [&] { wiz.enterAnswer = true; },
+        [] { Click("buttonBack"); },
+        [] { Click("buttonNext"); },
+        [] { Click("buttonFinish"); },
+    });
+    driver.Start();
+    EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
+    EXPECT_FALSE(wiz.EndedIncomplete());
+    EXPECT_EQ(wiz.enters, 2);
     EXPECT_EQ(wiz.finishes, 1);
 }
 
