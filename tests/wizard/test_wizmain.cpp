@@ -157,9 +157,9 @@ TEST(WizMain, FinishReturnsZeroInBothModes) {
 }
 
 TEST(WizMain, BatchRunWithoutDataStillRunsEveryPage) {
+    // No design data at all; an empty design is refused by General Setup.
     Qvz_MGTWizMain wiz("w", false);
-    Qvz_WizData d;
-    wiz.SetWizData(&d);
+    wiz.SetWizData(nullptr);
     EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
     EXPECT_EQ(wiz.GetFailedPageTitle(), "");
 }
