@@ -34,24 +34,6 @@ TEST(GeneralSetup, WithoutDataKeepsItsInitialValues) {
     }
 }
 
-TEST(GeneralSetup, PinNameListsAreFilledInOrder) {
-    TestPage page(nullptr);
-    EXPECT_EQ(page.m_pcsPins.GetSize(), 17);
-    EXPECT_EQ(page.m_pcsPins.GetAt(0), "CHBONDI");
-    EXPECT_EQ(page.m_pcsPins.GetAt(16), "TXRUNDISP");
-    EXPECT_EQ(Items(page.m_commaPins),
-              (Strings{"ENMCOMMAALIGN", "ENPCOMMAALIGN", "RXCHARISCOMMA", "RXCOMMADET", "RXCRCERR",
-                       "RXLOSSOFSYNC", "RXREALIGN"}));
-    EXPECT_EQ(Items(page.m_rxExtraPins), (Strings{"ENCHANSYNC", "CHBONDDONE", "CHBONDO", "CHBONDI",
-                                                  "ENMCOMMAALIGN", "ENPCOMMAALIGN", "LOOPBACK"}));
-    EXPECT_EQ(Items(page.m_userClockPins),
-              (Strings{"RXUSRCLK", "RXUSRCLK2", "TXUSRCLK", "TXUSRCLK2"}));
-    EXPECT_EQ(Items(page.m_tx64b66bPins),
-              (Strings{"TXENC64B66BUSE", "TXGEARBOX64B66BUSE", "TXSCRAM64B66BUSE"}));
-    EXPECT_EQ(Items(page.m_rx64b66bPins), (Strings{"RXDEC64B66BUSE", "RXBLOCKSYNC64B66BUSE",
-                                                   "RXDESCRAM64B66BUSE", "RXIGNOREBTF"}));
-}
-
 TEST(GeneralSetup, ConstructionReadsTheActiveBlock) {
     Design d(false, true, false);
     d.Block("OTHER", "GT10_CUSTOM", "10G Custom", "QVZ_RX_DATA_WIDTH", "4");
