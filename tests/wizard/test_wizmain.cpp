@@ -156,10 +156,12 @@ TEST(WizMain, FinishReturnsZeroInBothModes) {
     }
 }
 
-TEST(WizMain, BatchRunWithoutDataStillRunsEveryPage) {
-    // No design data at all; an empty design is refused by General Setup.
+TEST(WizMain, BatchRunWithoutAnActiveBlockIsRefused) {
+    // Pages that read the active block refuse the run when there is none;
+    // which page refuses first depends on which pages read in their batch step.
     Qvz_MGTWizMain wiz("w", false);
-    wiz.SetWizData(nullptr);
-    EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
-    EXPECT_EQ(wiz.GetFailedPageTitle(), "");
+    Qvz_WizData d;
+    wiz.SetWizData(&d);
+    EXPECT_EQ(wiz.Run(), Qvz_RunRefused);
+    EXPECT_NE(wiz.GetFailedPageTitle(), "");
 }
