@@ -156,10 +156,11 @@ TEST(WizMain, FinishReturnsZeroInBothModes) {
     }
 }
 
-TEST(WizMain, BatchRunWithoutDataStillRunsEveryPage) {
+TEST(WizMain, BatchRunWithoutActiveBlockIsRefusedByAPage) {
     Qvz_MGTWizMain wiz("w", false);
     Qvz_WizData d;
     wiz.SetWizData(&d);
-    EXPECT_EQ(wiz.Run(), Qvz_RunCompleted);
-    EXPECT_EQ(wiz.GetFailedPageTitle(), "");
+    // Nothing to configure: a page's batch step refuses, and the run names it.
+    EXPECT_EQ(wiz.Run(), Qvz_RunRefused);
+    EXPECT_FALSE(wiz.GetFailedPageTitle().IsEmpty());
 }
