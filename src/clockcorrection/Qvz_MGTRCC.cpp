@@ -1,6 +1,6 @@
 #include "Qvz_MGTRCC.h"
 
-#include "Qvz_PlaceholderGui.h"
+#include "Qvz_MGTRCCGui.h"
 #include "Qvz_WizMain.h"
 
 #include <QComboBox>
@@ -56,8 +56,13 @@ bool Qvz_MGTRCC::DoBatchPage() {
 bool Qvz_MGTRCC::CreateGuiDlg(QWidget* parent) {
     if (!parent)
         return false;
-    m_pGui = new (std::nothrow) Qvz_PlaceholderGui("Receiver Clock Correction Setup", parent);
+    m_pGui = new (std::nothrow) Qvz_MGTRCCGui(this, parent);
+    SetView(m_pGui);
     return FinishGuiCreation(m_pGui != nullptr);
+}
+
+Wg_WizardPage* Qvz_MGTRCC::GetGuiDlg() {
+    return m_pGui;
 }
 
 Port::StringBase Qvz_MGTRCC::GetBinaryValue(const Qvz_Attribute* attr) {

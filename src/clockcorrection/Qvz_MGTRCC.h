@@ -7,6 +7,7 @@
 
 class QComboBox;
 class QSpinBox;
+class Qvz_MGTRCCGui;
 class Wg_WizardPage;
 
 // What the page needs from its form while it reads the block in a window run.
@@ -33,7 +34,7 @@ public:
 
     bool DoBatchPage() override;
     bool CreateGuiDlg(QWidget* parent) override;
-    Wg_WizardPage* GetGuiDlg() override { return m_pGui; }
+    Wg_WizardPage* GetGuiDlg() override;
 
     // Active block -> fields. In a window run the form is loaded too.
     bool ReadWizData();
@@ -88,6 +89,6 @@ private:
                     Port::StringBase& text, int& value, int& low, int& high);
     Qvz_MGTRCCView* GuiView() const { return m_isBatch ? nullptr : m_pView; }
 
-    Wg_WizardPage* m_pGui = nullptr;
+    Qvz_MGTRCCGui* m_pGui = nullptr;
     Qvz_MGTRCCView* m_pView = nullptr;
 };
