@@ -91,7 +91,10 @@ void Qvz_MGTPageGui::SetupEntry(int index, QLineEdit* lineEdit, const char* patt
 bool Qvz_MGTPageGui::CheckEntries() {
     for (const LEValidator& e : m_entries) {
         QLineEdit* le = e.m_pLineEdit;
-        if (!le || !le->isEnabled() || le->hasAcceptableInput())
+        // A hidden entry cannot be corrected by the user, so it must not hold
+        // the page either.
+        const bool hidden = le && le->parentWidget() && !le->isVisibleTo(le->window());
+        if (!le || !le->isEnabled() || hidden || le->hasAcceptableInput())
             continue;
         if (m_pBasePage)
             m_pBasePage->IssueMessage(e.m_message, false, false, false);

@@ -426,6 +426,21 @@ TEST(TransmitterGui, NextChecksOnlyEnabledEntries) {
     EXPECT_EQ(t.wiz->Messages()[0], "Please enter a valid 8-bit binary value for Forced CRC value");
 }
 
+TEST(TransmitterGui, HiddenEntriesDoNotHoldNext) {
+    // Without TXCRCINITVAL its entry is hidden but stays enabled with CRC on:
+    // bad text there must not stop Next with a message about an unseen field.
+    Qvz_WizData d = LoadFixture("gt10_custom.json");
+    d.GetActiveBlock()->RemoveAttribute("TXCRCINITVAL");
+    TxGui t(std::move(d));
+    t.gui->onActive();
+    t.W<QCheckBox>("cbCRC")->setChecked(true);
+    t.SetText("leCRCinit", "not hex");
+    ASSERT_TRUE(t.Enabled("leCRCinit"));
+    ASSERT_FALSE(t.Shown("leCRCinit"));
+    EXPECT_TRUE(t.gui->onNext());
+    EXPECT_TRUE(t.wiz->Messages().empty());
+}
+
 TEST(TransmitterGui, FirstBadEntryStopsNextWithItsMessageAndFocus) {
     struct Case {
         const char* entry;
