@@ -12,7 +12,7 @@ class Qvz_MGTRCDGui : public Qvz_MGTPageGui {
     Q_OBJECT
 public:
     // Validated entries, in checking order.
-    enum Entry { kPlusComma = 0, kMinusComma, kCommaMask, kEntryCount };
+    enum EntryIndex { kPlusComma = 0, kMinusComma, kCommaMask, kEntryCount };
 
     Qvz_MGTRCDGui(Qvz_MGTRCD* page, QWidget* parent);
     ~Qvz_MGTRCDGui() override;
