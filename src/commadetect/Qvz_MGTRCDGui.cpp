@@ -8,14 +8,14 @@
 namespace {
 
 // Pattern and message of each validated entry, by family.
-struct EntrySpec {
+struct EntryPatterns {
     const char* gt11Pattern;
     const char* gt11Message;
     const char* pattern;
     const char* message;
 };
 
-const EntrySpec kEntries[Qvz_MGTRCDGui::kEntryCount] = {
+const EntryPatterns kEntries[Qvz_MGTRCDGui::kEntryCount] = {
     {"([0-9A-Fa-f]){8}", "Please enter a valid 8-digit hex value for Plus-comma value",
      "([01]){10}", "Please enter a valid 10-bit binary value for Plus-comma value"},
     {"([0-9A-Fa-f]){8}", "Please enter a valid 8-digit hex value for Minus-comma value",
@@ -86,7 +86,7 @@ void Qvz_MGTRCDGui::SetupEntries() {
     const bool gt11 = m_pPage && m_pPage->m_isGT11;
     QLineEdit* const edits[kEntryCount] = {m_pForm->lePCV, m_pForm->leMCV, m_pForm->leCommaMask};
     for (int i = 0; i < kEntryCount; ++i) {
-        const EntrySpec& e = kEntries[i];
+        const EntryPatterns& e = kEntries[i];
         SetupEntry(i, edits[i], gt11 ? e.gt11Pattern : e.pattern, gt11 ? e.gt11Message : e.message);
     }
     ConnectEntries(this, &Qvz_MGTRCDGui::ValidateLE_ALL);
@@ -224,7 +224,7 @@ void Qvz_MGTRCDGui::ValidateEntry(int index, QLineEdit* edit, const char* gt11Me
         return;
     // The entry's whole pattern, as Next checks it, not only its length: a
     // longer or non-digit text loaded from the block is no more valid.
-    const EntrySpec& e = kEntries[index];
+    const EntryPatterns& e = kEntries[index];
     const bool gt11 = m_pPage->m_isGT11;
     const QRegularExpression re(
         QRegularExpression::anchoredPattern(QString::fromUtf8(gt11 ? e.gt11Pattern : e.pattern)));
