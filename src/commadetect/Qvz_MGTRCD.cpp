@@ -1,6 +1,7 @@
 #include "Qvz_MGTRCD.h"
 
-#include "Qvz_PlaceholderGui.h"
+#include "Qvz_MGTRCDGui.h"
+#include "Qvz_MGTRCDWidget.h"
 #include "Qvz_WizMain.h"
 
 #include <new>
@@ -75,8 +76,12 @@ bool Qvz_MGTRCD::DoBatchPage() {
 bool Qvz_MGTRCD::CreateGuiDlg(QWidget* parent) {
     if (!parent)
         return false;
-    m_pGui = new (std::nothrow) Qvz_PlaceholderGui("Receiver Comma Detect Setup", parent);
+    m_pGui = new (std::nothrow) Qvz_MGTRCDGui(this, parent);
     return FinishGuiCreation(m_pGui != nullptr);
+}
+
+Wg_WizardPage* Qvz_MGTRCD::GetGuiDlg() {
+    return m_pGui;
 }
 
 Qvz_Block* Qvz_MGTRCD::ActiveBlock() const {
@@ -176,13 +181,14 @@ bool Qvz_MGTRCD::ReadWizData() {
     m_mcommaValue = m_isGT11 ? "00000000" : "1100000000";
     m_commaMask = m_isGT11 ? "000" : "0000000000";
 
-    if (!m_isBatch)
-        LoadGuiComboBoxes(block);
+    Qvz_MGTRCDGui* gui = Gui();
+    if (gui)
+        gui->LoadComboBoxes(block);
 
     if (const Qvz_Attribute* a = block->GetNamedAttribute("ALIGN_COMMA_WORD")) {
         m_alignCommaWord = a->GetValue();
-        if (!m_isBatch)
-            SetGuiAlignWord(m_alignCommaWord);
+        if (gui)
+            SetComboBoxText(gui->Form()->cbAlign, m_alignCommaWord);
     }
 
     m_turnOffComma = IsTrue(block, "QVZX_ONLY_TURNOFF_COMMA");
@@ -202,8 +208,10 @@ bool Qvz_MGTRCD::ReadWizData() {
         m_commaMask = ReadCommaMask(mask);
     }
 
-    if (!m_isBatch)
-        RefreshGui();
+    if (gui) {
+        gui->UpdateData(false);
+        gui->UpdateControls();
+    }
     return true;
 }
 
@@ -298,9 +306,3 @@ void Qvz_MGTRCD::ApplyTurnOffComma() {
     if (const Qvz_Attribute* mask = block->GetNamedAttribute("COMMA_10B_MASK"))
         m_commaMask = ReadCommaMask(mask);
 }
-
-void Qvz_MGTRCD::LoadGuiComboBoxes(Qvz_Block* /*block*/) {}
-
-void Qvz_MGTRCD::SetGuiAlignWord(const Port::StringBase& /*word*/) {}
-
-void Qvz_MGTRCD::RefreshGui() {}

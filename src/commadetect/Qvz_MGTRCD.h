@@ -8,6 +8,7 @@
 
 class Qvz_Attribute;
 class Qvz_Block;
+class Qvz_MGTRCDGui;
 class Wg_WizardPage;
 
 class Qvz_MGTRCD : public Qvz_MGTWizPage {
@@ -20,7 +21,7 @@ public:
 
     bool DoBatchPage() override;
     bool CreateGuiDlg(QWidget* parent) override;
-    Wg_WizardPage* GetGuiDlg() override { return m_pGui; }
+    Wg_WizardPage* GetGuiDlg() override;
 
     // Active block into the fields; false without data or active block.
     bool ReadWizData();
@@ -58,6 +59,7 @@ public:
     bool m_isGT = true;
     bool m_isGT10 = false;
     bool m_isGT11 = false;
+    Qvz_MGTRCDGui* m_pGui = nullptr;
 
 private:
     Qvz_Block* ActiveBlock() const;
@@ -71,11 +73,6 @@ private:
     // The mask digits of COMMA_10B_MASK, three of them on GT11.
     Port::StringBase ReadCommaMask(const Qvz_Attribute* attribute) const;
 
-    // Form hooks of a window run. The placeholder controller has no form, so
-    // these do nothing until the page has its own controller.
-    void LoadGuiComboBoxes(Qvz_Block* block);
-    void SetGuiAlignWord(const Port::StringBase& word);
-    void RefreshGui();
-
-    Wg_WizardPage* m_pGui = nullptr;
+    // The GUI side of a read; null in batch runs or before the controller exists.
+    Qvz_MGTRCDGui* Gui() const { return m_isBatch ? nullptr : m_pGui; }
 };

@@ -104,6 +104,21 @@ bool Qvz_MGTPageGui::CheckEntries() {
     return true;
 }
 
+void Qvz_MGTPageGui::FillComboBox(QComboBox* combo, const Qvz_Attribute* attribute) {
+    if (!combo)
+        return;
+    combo->clear();
+    if (!attribute)
+        return;
+    for (const Port::StringBase& v : attribute->GetLegalValues().Items())
+        combo->addItem(v.ToQString());
+}
+
+void Qvz_MGTPageGui::ReadComboBox(const QComboBox* combo, Port::StringBase& field) {
+    if (combo && combo->currentIndex() >= 0)
+        field = Port::StringBase::FromQString(combo->currentText());
+}
+
 Qvz_Block* Qvz_MGTPageGui::ActiveBlock() const {
     return m_pBasePage && m_pBasePage->m_pWizData ? m_pBasePage->m_pWizData->GetActiveBlock()
                                                   : nullptr;

@@ -44,10 +44,12 @@
 #include "Port_StringBase.h"
 #include "Wg_WizardPage.h"
 
+#include <QComboBox>
 #include <QLineEdit>
 
 #include <vector>
 
+class Qvz_Attribute;
 class Qvz_Block;
 class Qvz_MGTWizPage;
 
@@ -116,6 +118,12 @@ protected:
     // The first enabled entry without acceptable input gets its message and
     // the focus; false then.
     bool CheckEntries();
+    // Clears combo and fills it with the attribute's legal values in order;
+    // a null attribute leaves it empty.
+    static void FillComboBox(QComboBox* combo, const Qvz_Attribute* attribute);
+    // field <- combo's current text; left as it is when the list offers
+    // nothing, so that an empty list never blanks an attribute.
+    static void ReadComboBox(const QComboBox* combo, Port::StringBase& field);
     // The active block of the page's design data, or null.
     Qvz_Block* ActiveBlock() const;
     void EnableMoreInfo();
