@@ -5,21 +5,6 @@
 
 namespace {
 
-void FillFromLegalValues(QComboBox* combo, const Qvz_Attribute* attr) {
-    combo->clear();
-    if (!attr)
-        return;
-    for (const Port::StringBase& v : attr->GetLegalValues().Items())
-        combo->addItem(v.ToQString());
-}
-
-// The list's text, or the field unchanged when the list offers nothing
-// (a block without legal values must not get an empty value written).
-void TakeComboText(const QComboBox* combo, Port::StringBase& field) {
-    if (combo->currentIndex() >= 0)
-        field = Port::StringBase::FromQString(combo->currentText());
-}
-
 // Shows and enables a label and its control by the row's attribute.
 void ApplyCrcRow(const Qvz_Attribute* attr, bool crcUse, QWidget* label, QWidget* control) {
     QWidget* const widgets[2] = {label, control};
@@ -76,12 +61,12 @@ void Qvz_MGTTransmitterGui::LoadComboBoxes(Qvz_Block* block) {
     if (!block)
         return;
     if (block->SupportsMGT3())
-        FillFromLegalValues(m_pForm->cbOVS, block->GetNamedAttribute("TX_DIFF_CTRL"));
-    FillFromLegalValues(m_pForm->cbCRCwidth, block->GetNamedAttribute("QVZ_TXCRC_DATAWIDTH"));
-    FillFromLegalValues(m_pForm->cbCRCFormat, block->GetNamedAttribute("CRC_FORMAT"));
+        FillComboBox(m_pForm->cbOVS, block->GetNamedAttribute("TX_DIFF_CTRL"));
+    FillComboBox(m_pForm->cbCRCwidth, block->GetNamedAttribute("QVZ_TXCRC_DATAWIDTH"));
+    FillComboBox(m_pForm->cbCRCFormat, block->GetNamedAttribute("CRC_FORMAT"));
     if (!Qvz_MGTTransmitter::IsFibreChannel(block)) {
-        FillFromLegalValues(m_pForm->cbSOP, block->GetNamedAttribute("CRC_START_OF_PKT"));
-        FillFromLegalValues(m_pForm->cbEOP, block->GetNamedAttribute("CRC_END_OF_PKT"));
+        FillComboBox(m_pForm->cbSOP, block->GetNamedAttribute("CRC_START_OF_PKT"));
+        FillComboBox(m_pForm->cbEOP, block->GetNamedAttribute("CRC_END_OF_PKT"));
     }
 }
 
@@ -146,19 +131,19 @@ void Qvz_MGTTransmitterGui::WidgetsToData() {
             p.m_preEmphasisText.Format("%d", p.m_preEmphasisLevel);
         }
         if (block->GetNamedAttribute("TX_DIFF_CTRL"))
-            TakeComboText(f.cbOVS, p.m_diffCtrl);
+            ReadComboBox(f.cbOVS, p.m_diffCtrl);
     }
     if (block) {
         if (block->GetNamedAttribute("CRC_FORMAT"))
-            TakeComboText(f.cbCRCFormat, p.m_crcFormat);
+            ReadComboBox(f.cbCRCFormat, p.m_crcFormat);
         const bool fibreChannel = Qvz_MGTTransmitter::IsFibreChannel(block);
         if (!fibreChannel && block->GetNamedAttribute("CRC_START_OF_PKT"))
-            TakeComboText(f.cbSOP, p.m_crcStartOfPkt);
+            ReadComboBox(f.cbSOP, p.m_crcStartOfPkt);
         if (!fibreChannel && block->GetNamedAttribute("CRC_END_OF_PKT"))
-            TakeComboText(f.cbEOP, p.m_crcEndOfPkt);
+            ReadComboBox(f.cbEOP, p.m_crcEndOfPkt);
     }
 
-    TakeComboText(f.cbCRCwidth, p.m_crcDataWidth);
+    ReadComboBox(f.cbCRCwidth, p.m_crcDataWidth);
     p.m_crcInitVal = Port::StringBase::FromQString(f.leCRCinit->text());
     p.m_preTapDac = Port::StringBase::FromQString(f.lePreTapDac->text());
     p.m_datTapDac = Port::StringBase::FromQString(f.leDatTapDac->text());
