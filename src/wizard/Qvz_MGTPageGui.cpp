@@ -4,6 +4,7 @@
 #include "Qvz_WizMain.h"
 #include "Wg_Wizard.h"
 
+#include <QComboBox>
 #include <QRegularExpression>
 #include <QRegularExpressionValidator>
 
@@ -93,6 +94,8 @@ bool Qvz_MGTPageGui::CheckEntries() {
         QLineEdit* le = e.m_pLineEdit;
         if (!le || !le->isEnabled() || le->hasAcceptableInput())
             continue;
+        if (pageWidget() && !le->isVisibleTo(pageWidget()))
+            continue;
         if (m_pBasePage)
             m_pBasePage->IssueMessage(e.m_message, false, false, false);
         le->setFocus();
@@ -111,4 +114,30 @@ void Qvz_MGTPageGui::EnableMoreInfo() {
     Qvz_WizMain* main = m_pBasePage ? m_pBasePage->m_pWizMain : nullptr;
     if (main && main->m_pWizard)
         main->m_pWizard->enableMoreInfo(true);
+}
+
+void Qvz_MGTPageGui::FillFromLegalValues(QComboBox* combo, const Qvz_Attribute* attr) {
+    if (!combo)
+        return;
+    combo->clear();
+    if (!attr)
+        return;
+    for (const Port::StringBase& v : attr->GetLegalValues().Items())
+        combo->addItem(v.ToQString());
+}
+
+void Qvz_MGTPageGui::TakeComboText(const QComboBox* combo, Port::StringBase& field) {
+    if (combo && combo->currentIndex() >= 0)
+        field = Port::StringBase::FromQString(combo->currentText());
+}
+
+void Qvz_MGTPageGui::ApplyAttrRow(const Qvz_Attribute* attr, bool on,
+                                  std::initializer_list<QWidget*> widgets) {
+    for (QWidget* w : widgets) {
+        if (!w)
+            continue;
+        w->setVisible(attr != nullptr);
+        if (attr)
+            w->setEnabled(on && attr->IsEditable());
+    }
 }

@@ -46,8 +46,11 @@
 
 #include <QLineEdit>
 
+#include <initializer_list>
 #include <vector>
 
+class QComboBox;
+class Qvz_Attribute;
 class Qvz_Block;
 class Qvz_MGTWizPage;
 
@@ -114,11 +117,24 @@ protected:
                         Qt::UniqueConnection);
     }
     // The first enabled entry without acceptable input gets its message and
-    // the focus; false then.
+    // the focus; false then. Entries hidden in the form are passed over: the
+    // user could neither see the message's entry nor correct it.
     bool CheckEntries();
     // The active block of the page's design data, or null.
     Qvz_Block* ActiveBlock() const;
     void EnableMoreInfo();
+
+    // Clears combo and refills it with attr's legal values, in their order;
+    // it stays empty without attr.
+    static void FillFromLegalValues(QComboBox* combo, const Qvz_Attribute* attr);
+    // The list's current text into field; the field stays as it is when the
+    // list offers nothing (a block without legal values must not get an
+    // empty value written).
+    static void TakeComboText(const QComboBox* combo, Port::StringBase& field);
+    // The controls of one attribute: hidden when attr is absent, else shown
+    // and enabled when on and attr is editable. Null widgets are skipped.
+    static void ApplyAttrRow(const Qvz_Attribute* attr, bool on,
+                             std::initializer_list<QWidget*> widgets);
 
     std::vector<LEValidator> m_entries;
     Qvz_MGTWizPage* m_pBasePage = nullptr;
