@@ -31,9 +31,10 @@ void TakeComboText(const QComboBox* combo, Port::StringBase& field) {
         field = TextOf(combo);
 }
 
-// Exclusive radio buttons cannot be switched off; the sibling is switched on.
-void SetOn(QRadioButton* on, QRadioButton* off, bool first) {
-    (first ? on : off)->setChecked(true);
+// Switches ifTrue on when condition holds, else its sibling: exclusive radio
+// buttons cannot be switched off by themselves.
+void SetOn(QRadioButton* ifTrue, QRadioButton* otherwise, bool condition) {
+    (condition ? ifTrue : otherwise)->setChecked(true);
 }
 
 } // namespace
