@@ -8,10 +8,18 @@
 #include <QJsonParseError>
 #include <QSet>
 
+#include <cerrno>
 #include <cmath>
+#include <cstring>
 #include <initializer_list>
 #include <utility>
 #include <vector>
+
+#ifdef Q_OS_UNIX
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#endif
 
 namespace {
 
@@ -458,22 +466,94 @@ bool Load(const QByteArray& text, const QString& source, Qvz_WizData& out, QStri
     return true;
 }
 
-bool LoadFile(const QString& path, Qvz_WizData& out, QString& error) {
-    QFileInfo info(path);
-    if (info.isDir()) {
+namespace {
+
+// Far beyond any design data; an endless source (a device, a pipe fed
+// forever) is refused here instead of exhausting memory.
+constexpr qint64 kMaxFileBytes = qint64(1) << 30;
+
+QString CannotRead(const QString& path, const QString& why) {
+    return path + ": cannot read: " + why;
+}
+
+// Qt resources and platforms without POSIX files.
+bool ReadQFile(const QString& path, QByteArray& text, QString& error) {
+    QFile f(path);
+    if (!f.open(QIODevice::ReadOnly)) {
+        error = CannotRead(path, f.errorString());
+        return false;
+    }
+    text = f.read(kMaxFileBytes + 1);
+    if (f.error() != QFileDevice::NoError)
+        error = CannotRead(path, f.errorString());
+    else if (text.size() > kMaxFileBytes)
+        error = CannotRead(path, "larger than 1 GiB");
+    return error.isEmpty();
+}
+
+#ifdef Q_OS_UNIX
+// Only regular files and pipes hold design data; a named pipe nobody writes
+// to reads as empty instead of blocking forever.
+bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
+    if (path.startsWith(':'))
+        return ReadQFile(path, text, error);
+    const int fd =
+        ::open(QFile::encodeName(path).constData(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
+    if (fd < 0) {
+        error = CannotRead(path, QString::fromLocal8Bit(std::strerror(errno)));
+        return false;
+    }
+    struct stat st {};
+    QString why;
+    if (::fstat(fd, &st) != 0)
+        why = QString::fromLocal8Bit(std::strerror(errno));
+    else if (S_ISDIR(st.st_mode))
+        error = path + ": is a directory, not a design-data file";
+    else if (!S_ISREG(st.st_mode) && !S_ISFIFO(st.st_mode))
+        why = "not a regular file";
+    if (why.isEmpty() && error.isEmpty()) {
+        ::fcntl(fd, F_SETFL, ::fcntl(fd, F_GETFL) & ~O_NONBLOCK);
+        char buf[1 << 16];
+        for (;;) {
+            const ssize_t n = ::read(fd, buf, sizeof buf);
+            if (n < 0 && errno == EINTR)
+                continue;
+            if (n < 0) {
+                why = QString::fromLocal8Bit(std::strerror(errno));
+                break;
+            }
+            if (n == 0)
+                break;
+            if (text.size() + n > kMaxFileBytes) {
+                why = "larger than 1 GiB";
+                break;
+            }
+            text.append(buf, n);
+        }
+        if (why.isEmpty() && text.isEmpty() && S_ISFIFO(st.st_mode))
+            why = "nothing was written to this pipe";
+    }
+    ::close(fd);
+    if (!why.isEmpty())
+        error = CannotRead(path, why);
+    return error.isEmpty();
+}
+#else
+bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
+    if (QFileInfo(path).isDir()) {
         error = path + ": is a directory, not a design-data file";
         return false;
     }
-    QFile f(path);
-    if (!f.open(QIODevice::ReadOnly)) {
-        error = path + ": cannot read: " + f.errorString();
+    return ReadQFile(path, text, error);
+}
+#endif
+
+} // namespace
+
+bool LoadFile(const QString& path, Qvz_WizData& out, QString& error) {
+    QByteArray text;
+    if (!ReadDesignFile(path, text, error))
         return false;
-    }
-    const QByteArray text = f.readAll();
-    if (f.error() != QFileDevice::NoError) {
-        error = path + ": cannot read: " + f.errorString();
-        return false;
-    }
     return Load(text, path, out, error);
 }
 
