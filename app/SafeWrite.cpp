@@ -263,12 +263,14 @@ bool SameFile(const QString& a, const QString& b) {
     if (a == "-" || b == "-")
         return a == b;
 #ifdef Q_OS_UNIX
-    struct stat sa {
-    }, sb{};
+    struct stat sa {};
+    struct stat sb {};
     const bool hasA = ::stat(QFile::encodeName(a).constData(), &sa) == 0;
     const bool hasB = ::stat(QFile::encodeName(b).constData(), &sb) == 0;
+    // Devices and pipes hold nothing one write could destroy for the other
+    // (both into /dev/null is fine).
     if (hasA && hasB)
-        return sa.st_dev == sb.st_dev && sa.st_ino == sb.st_ino;
+        return S_ISREG(sa.st_mode) && sa.st_dev == sb.st_dev && sa.st_ino == sb.st_ino;
     if (hasA != hasB)
         return false;
 #endif

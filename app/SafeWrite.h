@@ -26,8 +26,8 @@ namespace SafeWrite {
 // naming the path leaves any earlier file at path as it was.
 bool WriteFile(const QString& path, const QByteArray& bytes, QString& error);
 
-// True when a and b name the same file: the same file on disk when both
-// exist (links and hard links included), else the same absolute path.
+// True when a and b name the same file: the same regular file on disk when
+// both exist (links and hard links included), else the same absolute path.
 // "-" (standard output) is the same only as "-".
 bool SameFile(const QString& a, const QString& b);
 

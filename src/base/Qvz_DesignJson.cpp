@@ -17,6 +17,7 @@
 
 #ifdef Q_OS_UNIX
 #include <fcntl.h>
+#include <poll.h>
 #include <sys/stat.h>
 #include <unistd.h>
 #endif
@@ -492,8 +493,35 @@ bool ReadQFile(const QString& path, QByteArray& text, QString& error) {
 }
 
 #ifdef Q_OS_UNIX
-// Only regular files and pipes hold design data; a named pipe nobody writes
-// to reads as empty instead of blocking forever.
+constexpr int kPipeWaitMs = 5000;
+
+// A named pipe opened before anyone writes to it reads as at its end, where
+// a plain open would have hung for ever: wait a while for a writer, then
+// give up. A pipe that has a writer, however slow, is read as usual. Returns
+// why reading cannot go on, else "".
+QString AwaitPipeWriter(int fd, QByteArray& text) {
+    char c;
+    ssize_t n;
+    do
+        n = ::read(fd, &c, 1);
+    while (n < 0 && errno == EINTR);
+    if (n > 0)
+        text.append(c);
+    if (n > 0 || (n < 0 && errno == EAGAIN))
+        return {};
+    if (n < 0)
+        return QString::fromLocal8Bit(std::strerror(errno));
+    pollfd p{fd, POLLIN, 0};
+    int ready;
+    do
+        ready = ::poll(&p, 1, kPipeWaitMs);
+    while (ready < 0 && errno == EINTR);
+    if (ready == 0)
+        return QString("nobody wrote to this pipe within %1 seconds").arg(kPipeWaitMs / 1000);
+    return {};
+}
+
+// Only regular files and pipes hold design data.
 bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
     if (path.startsWith(':'))
         return ReadQFile(path, text, error);
@@ -511,6 +539,8 @@ bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
         error = path + ": is a directory, not a design-data file";
     else if (!S_ISREG(st.st_mode) && !S_ISFIFO(st.st_mode))
         why = "not a regular file";
+    if (why.isEmpty() && error.isEmpty() && S_ISFIFO(st.st_mode))
+        why = AwaitPipeWriter(fd, text);
     if (why.isEmpty() && error.isEmpty()) {
         ::fcntl(fd, F_SETFL, ::fcntl(fd, F_GETFL) & ~O_NONBLOCK);
         char buf[1 << 16];
