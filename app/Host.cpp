@@ -3,6 +3,7 @@
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTWizMain.h"
 #include "Qvz_Summary.h"
+#include "SafeWrite.h"
 
 #include <QApplication>
 #include <QCommandLineParser>
@@ -12,12 +13,7 @@
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QSaveFile>
 #include <QTextStream>
-
-#include <cerrno>
-#include <cstdio>
-#include <cstring>
 
 namespace VelomuxHost {
 namespace {
@@ -59,7 +55,8 @@ const char* const kHelp =
     "  -v, --version        show the version.\n"
     "\n"
     "Exit status: 0 completed, 1 refused or cancelled, 2 usage error, 3 input error,\n"
-    "4 the output could not be written.\n"
+    "4 the output or the report could not be written, 129/130/143 ended by SIGHUP/SIGINT/\n"
+    "SIGTERM (nothing more is written; a file being written is left as it was).\n"
     "\n"
     "Example:\n"
     "  velomux-wizard --batch --target gt10 --type \"10G Custom\" --width 4 \\\n"
@@ -99,39 +96,9 @@ int InputError(const QString& message) {
 // Writes bytes to path atomically ('-': standard output). False leaves any
 // earlier file at path as it was.
 bool WriteAtomically(const QString& path, const QByteArray& bytes, QString& error) {
-    if (path == "-") {
-        Out().flush();
-        const bool ok = std::fwrite(bytes.constData(), 1, std::size_t(bytes.size()), stdout) ==
-                            std::size_t(bytes.size()) &&
-                        std::fflush(stdout) == 0;
-        if (!ok)
-            error = "cannot write to standard output";
-        return ok;
-    }
-    if (QFileInfo(path).isDir()) {
-        error = path + ": is a directory";
-        return false;
-    }
-    QSaveFile file(path);
-    if (!file.open(QIODevice::WriteOnly)) {
-        error = path + ": cannot write: " + file.errorString();
-        return false;
-    }
-    // Check the flush too: a short write (disk full, file-size limit) only
-    // shows there, and commit would otherwise rename a truncated file.
-    if (file.write(bytes) != bytes.size() || !file.flush() || file.error() != QFileDevice::NoError ||
-        file.size() != bytes.size()) {
-        const int err = errno;
-        error = path + ": cannot write: " +
-                (err ? QString::fromLocal8Bit(std::strerror(err)) : file.errorString());
-        file.cancelWriting();
-        return false;
-    }
-    if (!file.commit()) {
-        error = path + ": cannot write: " + file.errorString();
-        return false;
-    }
-    return true;
+    // The summary so far goes out before anything written to standard output.
+    Out().flush();
+    return SafeWrite::WriteFile(path, bytes, error);
 }
 
 QByteArray ReportJson(Qvz_RunMode mode, int exitCode, const Qvz_WizMain& wiz) {
@@ -308,6 +275,13 @@ int Run(const QStringList& args) {
     const int parsed = Parse(args, opt);
     if (parsed >= 0)
         return parsed;
+    // The report must not overwrite the design data it reports on.
+    if (!opt.report.isEmpty() && !opt.output.isEmpty() &&
+        SafeWrite::SameFile(opt.report, opt.output))
+        return UsageError("--report and -o name the same file");
+    if (!opt.report.isEmpty() && !opt.design.isEmpty() &&
+        SafeWrite::SameFile(opt.report, opt.design))
+        return UsageError("--report names the design-data file");
 
     Qvz_WizData data;
     QString error;

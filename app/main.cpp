@@ -1,10 +1,13 @@
 #include "Host.h"
+#include "SafeWrite.h"
 
 #include <QApplication>
 #include <QCoreApplication>
 #include <memory>
 
 int main(int argc, char** argv) {
+    // Before anything is written: an interrupted write must clean up after itself.
+    VelomuxHost::InstallSignalHandlers();
     QStringList args;
     for (int i = 0; i < argc; ++i)
         args << QString::fromLocal8Bit(argv[i]);

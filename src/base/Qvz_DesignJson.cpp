@@ -8,10 +8,19 @@
 #include <QJsonParseError>
 #include <QSet>
 
+#include <cerrno>
 #include <cmath>
+#include <cstring>
 #include <initializer_list>
 #include <utility>
 #include <vector>
+
+#ifdef Q_OS_UNIX
+#include <fcntl.h>
+#include <poll.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#endif
 
 namespace {
 
@@ -458,22 +467,123 @@ bool Load(const QByteArray& text, const QString& source, Qvz_WizData& out, QStri
     return true;
 }
 
-bool LoadFile(const QString& path, Qvz_WizData& out, QString& error) {
-    QFileInfo info(path);
-    if (info.isDir()) {
+namespace {
+
+// Far beyond any design data; an endless source (a device, a pipe fed
+// forever) is refused here instead of exhausting memory.
+constexpr qint64 kMaxFileBytes = qint64(1) << 30;
+
+QString CannotRead(const QString& path, const QString& why) {
+    return path + ": cannot read: " + why;
+}
+
+// Qt resources and platforms without POSIX files.
+bool ReadQFile(const QString& path, QByteArray& text, QString& error) {
+    QFile f(path);
+    if (!f.open(QIODevice::ReadOnly)) {
+        error = CannotRead(path, f.errorString());
+        return false;
+    }
+    text = f.read(kMaxFileBytes + 1);
+    if (f.error() != QFileDevice::NoError)
+        error = CannotRead(path, f.errorString());
+    else if (text.size() > kMaxFileBytes)
+        error = CannotRead(path, "larger than 1 GiB");
+    return error.isEmpty();
+}
+
+#ifdef Q_OS_UNIX
+constexpr int kPipeWaitMs = 5000;
+
+// A named pipe opened before anyone writes to it reads as at its end, where
+// a plain open would have hung for ever: wait a while for a writer, then
+// give up. A pipe that has a writer, however slow, is read as usual. Returns
+// why reading cannot go on, else "".
+QString AwaitPipeWriter(int fd, QByteArray& text) {
+    char c;
+    ssize_t n;
+    do
+        n = ::read(fd, &c, 1);
+    while (n < 0 && errno == EINTR);
+    if (n > 0)
+        text.append(c);
+    if (n > 0 || (n < 0 && errno == EAGAIN))
+        return {};
+    if (n < 0)
+        return QString::fromLocal8Bit(std::strerror(errno));
+    pollfd p{fd, POLLIN, 0};
+    int ready;
+    do
+        ready = ::poll(&p, 1, kPipeWaitMs);
+    while (ready < 0 && errno == EINTR);
+    if (ready == 0)
+        return QString("nobody wrote to this pipe within %1 seconds").arg(kPipeWaitMs / 1000);
+    return {};
+}
+
+// Only regular files and pipes hold design data.
+bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
+    if (path.startsWith(':'))
+        return ReadQFile(path, text, error);
+    const int fd =
+        ::open(QFile::encodeName(path).constData(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
+    if (fd < 0) {
+        error = CannotRead(path, QString::fromLocal8Bit(std::strerror(errno)));
+        return false;
+    }
+    struct stat st {};
+    QString why;
+    if (::fstat(fd, &st) != 0)
+        why = QString::fromLocal8Bit(std::strerror(errno));
+    else if (S_ISDIR(st.st_mode))
+        error = path + ": is a directory, not a design-data file";
+    else if (!S_ISREG(st.st_mode) && !S_ISFIFO(st.st_mode))
+        why = "not a regular file";
+    if (why.isEmpty() && error.isEmpty() && S_ISFIFO(st.st_mode))
+        why = AwaitPipeWriter(fd, text);
+    if (why.isEmpty() && error.isEmpty()) {
+        ::fcntl(fd, F_SETFL, ::fcntl(fd, F_GETFL) & ~O_NONBLOCK);
+        char buf[1 << 16];
+        for (;;) {
+            const ssize_t n = ::read(fd, buf, sizeof buf);
+            if (n < 0 && errno == EINTR)
+                continue;
+            if (n < 0) {
+                why = QString::fromLocal8Bit(std::strerror(errno));
+                break;
+            }
+            if (n == 0)
+                break;
+            if (text.size() + n > kMaxFileBytes) {
+                why = "larger than 1 GiB";
+                break;
+            }
+            text.append(buf, n);
+        }
+        if (why.isEmpty() && text.isEmpty() && S_ISFIFO(st.st_mode))
+            why = "nothing was written to this pipe";
+    }
+    ::close(fd);
+    if (!why.isEmpty())
+        error = CannotRead(path, why);
+    return error.isEmpty();
+}
+#else
+bool ReadDesignFile(const QString& path, QByteArray& text, QString& error) {
+    if (QFileInfo(path).isDir()) {
         error = path + ": is a directory, not a design-data file";
         return false;
     }
-    QFile f(path);
-    if (!f.open(QIODevice::ReadOnly)) {
-        error = path + ": cannot read: " + f.errorString();
+    return ReadQFile(path, text, error);
+}
+#endif
+
+} // namespace
+
+bool LoadFile(const QString& path, Qvz_WizData& out, QString& error) {
+    QByteArray text;
+    if (!ReadDesignFile(path, text, error))
         return false;
-    }
-    const QByteArray text = f.readAll();
-    if (f.error() != QFileDevice::NoError) {
-        error = path + ": cannot read: " + f.errorString();
-        return false;
-    }
     return Load(text, path, out, error);
 }
 
