@@ -224,9 +224,9 @@ TEST(GeneralBatch, ObsoleteZephine8RunsAsZephine4) {
     // Its bonding number of 2 gives it one bonded copy at finish.
     EXPECT_EQ(r.Active(), (Strings{"GT10_ZEPHINE_4_INST1", "GT10_ZEPHINE_4_INST2"}));
     ExpectAttributes(r.Block("GT10_ZEPHINE_4_INST1"), {{"QVZ_RX_DATA_WIDTH", "4"},
-                                                      {"SH_CNT_MAX", nullptr},
-                                                      {"COMMA_10B_MASK", "1111111111"},
-                                                      {"QVZ_CHAN_BOND_NUMBER", "2"}});
+                                                       {"SH_CNT_MAX", nullptr},
+                                                       {"COMMA_10B_MASK", "1111111111"},
+                                                       {"QVZ_CHAN_BOND_NUMBER", "2"}});
     // The obsolete block itself is not written.
     ExpectAttributes(r.Block("GT10_ZEPHINE_8_INST"),
                      {{"SH_CNT_MAX", "64"}, {"QVZ_BOOL_TX_USE", nullptr}});
