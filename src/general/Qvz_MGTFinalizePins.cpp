@@ -166,6 +166,9 @@ void Qvz_MGTGeneralSetup::GroundFloatingInputs(Qvz_Block* block) {
         // A pin wired bit by bit is connected even without a whole-pin signal.
         if (pin->HasPinSigBitProp())
             continue;
+        // The GT11 tile bus is wired by the bonding step, which comes later.
+        if (m_isGT11 && Is(pin->GetName(), "COMBUSIN"))
+            continue;
         if (!Is(pin->GetAttributeValue("QVZ_PIN_TIE"), "TRUE") && pin->GetSigName().IsEmpty() &&
             Is(pin->GetDirection(), "IN"))
             pin->SetIsGrounded(true);

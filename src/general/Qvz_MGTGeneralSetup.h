@@ -73,7 +73,8 @@ public:
     void BuildRxTenBitBus(Qvz_Block* block);
     // Ties the bits of a CRC data-width pin to the code of the CRC width.
     void TieCrcDataWidth(Qvz_Block* block, Qvz_Pin* pin, bool tx);
-    // Ties to 0 every input that is still connected to nothing.
+    // Ties to 0 every input that is still connected to nothing (not the
+    // GT11 tile bus, which the bonding step wires).
     void GroundFloatingInputs(Qvz_Block* block);
     // Connects the pin to an external signal of its own; dataWidth in bytes
     // (below 1: unknown, the pin's own width is used).

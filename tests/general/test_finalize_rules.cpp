@@ -380,9 +380,8 @@ TEST(Finish, Gt11AddsTheTileBusPinsOnce) {
     EXPECT_EQ(pins[2]->GetName(), "COMBUSOUT");
     EXPECT_EQ(pins[2]->GetDirection(), "OUT");
     EXPECT_EQ(pins[2]->GetWidth(), 16);
-    // Left as they are: the bonding step wires them; an input left with
-    // nothing is grounded like any other.
-    EXPECT_EQ(bench.Of("COMBUSIN"), "tie 0");
+    // Left for the bonding step to wire: not grounded as a floating input.
+    EXPECT_EQ(bench.Of("COMBUSIN"), "unconnected");
     EXPECT_EQ(bench.Of("COMBUSOUT"), "unconnected");
 }
 
