@@ -2,6 +2,7 @@
 // helpers the routine builds ports, buses and ties with.
 
 #include "FinalizeSupport.h"
+#include "Qvz_Summary.h"
 
 #include <gtest/gtest.h>
 
@@ -208,6 +209,8 @@ const RuleCase kRules[] = {
      "unconnected"},
     {"30 TXUSRCLK, transmitter unused", F::GT10, "TXUSRCLK/OUT", "QVZ_BOOL_TX_USE=FALSE",
      "port TXUSRCLK_OUT/1"},
+    {"29/30 user clocks, neither direction", F::GT11, "TXUSRCLK2/IN",
+     "QVZ_BOOL_RX_USE=FALSE;QVZ_BOOL_TX_USE=FALSE", "port TXUSRCLK2_IN/1"},
     {"31 RXRECCLK, receiver unused, fixed GT primitive", F::GT, "RXRECCLK/OUT",
      "prim=GT_FIBRE_CHAN;QVZ_BOOL_RX_USE=FALSE", "unconnected"},
     {"31 RXRECCLK, receiver unused, GT10 bypassed", F::GT10, "RXRECCLK/OUT",
@@ -657,4 +660,35 @@ TEST(PinLists, AnswerForTheirOwnNamesExactly) {
     EXPECT_FALSE(page.IsInTx64b66bPinList("RXDEC64B66BUSE"));
     EXPECT_TRUE(page.IsInRx64b66bPinList("RXIGNOREBTF"));
     EXPECT_FALSE(page.IsInRx64b66bPinList(""));
+}
+
+TEST(FinishSummary, TellsEveryOutcomeOfThePins) {
+    FinishBench bench(F::GT10, "QVZ_CHAN_BOND_NUMBER=2;QVZ_TX_DATA_WIDTH=2");
+    for (const char* pin : {"REFCLK/IN", "CONFIGIN/IN", "CONFIGOUT/OUT", "CHBONDO/OUT/5",
+                            "TXDATA/IN/32/dw", "TXCHARDISPVAL/IN/4/dw", "TXCHARDISPMODE/IN/4/dw"})
+        bench.AddPin(pin);
+    bench.Page().FinalizePins();
+    const Qvz_Summary s = Qvz_Summary::Of(bench.Data());
+    ASSERT_EQ(s.ports.size(), 1u);
+    EXPECT_EQ(s.ports[0].signal, "REFCLK_IN");
+    ASSERT_EQ(s.ties.size(), 1u);
+    EXPECT_EQ(s.ties[0].pin, "CONFIGIN");
+    EXPECT_EQ(s.unconnected, std::vector<QString>{"CONFIGOUT"});
+    ASSERT_EQ(s.wired.size(), 1u);
+    EXPECT_EQ(s.wired[0].pin, "CHBONDO");
+    EXPECT_EQ(s.wired[0].signal, "CHANBOND_M_S1_OUT");
+    EXPECT_EQ(s.bitMapped.size(), 3u);
+
+    const QString text = s.ToText(false);
+    for (const char* line :
+         {"Tied pins:     1", "Internal pins: 1", "  CHBONDO -> CHANBOND_M_S1_OUT",
+          "Unconnected:   1", "  CONFIGOUT", "Bit-wise:      TXDATA"})
+        EXPECT_TRUE(text.contains(line)) << line << "\n" << text.toStdString();
+    // The command line's short form keeps the counts.
+    EXPECT_TRUE(s.ToText(true).contains("Unconnected:   1"));
+    EXPECT_FALSE(s.ToText(true).contains("  CONFIGOUT"));
+    const QString html = s.ToHtml(true);
+    for (const char* part :
+         {"Unconnected pins (1)", "CONFIGOUT", "Pins on internal signals (1)", "CHANBOND_M_S1_OUT"})
+        EXPECT_TRUE(html.contains(part)) << part;
 }
