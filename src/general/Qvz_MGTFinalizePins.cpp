@@ -258,45 +258,40 @@ void Qvz_MGTGeneralSetup::MakePinPort(Qvz_Pin* pin, int dataWidth) {
 
 namespace {
 
-// One direction of the 10-bit bus: the data pin, the pins of bits 8 and 9 of
-// each ten, and the names involved.
+// One direction of the 10-bit bus.
 struct TenBitBus {
-    const char* dataPin;
-    const char* bit8Pin;
-    const char* bit9Pin;
-    const char* widthGT;
-    const char* widthOther;
+    // The data pin, and the one-bit-per-byte pins of bits 8 and 9 of each ten.
+    const char* pins[3];
+    const char* widthAttr[2]; // GT, the later families
     const char* existingSignal;
     const char* newSignal;
     const char* direction;
     const char* spareSuffix;
     bool spareConstant0;
+    bool dataSpareAlwaysBus;
+    // Signals of the pins' own ports, which the bus replaces.
     const char* leftovers[4];
 };
 
 const TenBitBus kTxBus = {
-    "TXDATA",
-    "TXCHARDISPVAL",
-    "TXCHARDISPMODE",
-    "TX_DATA_WIDTH",
-    "QVZ_TX_DATA_WIDTH",
+    {"TXDATA", "TXCHARDISPVAL", "TXCHARDISPMODE"},
+    {"TX_DATA_WIDTH", "QVZ_TX_DATA_WIDTH"},
     "TXDATA",
     "TXDATA_IN",
     "I",
     "_GND",
     true,
+    false,
     {"TXCHARDISPVAL_IN", "TXCHARDISPVAL", "TXCHARDISPMODE_IN", "TXCHARDISPMODE"}};
 
-const TenBitBus kRxBus = {"RXDATA",
-                          "RXRUNDISP",
-                          "RXCHARISK",
-                          "RX_DATA_WIDTH",
-                          "QVZ_RX_DATA_WIDTH",
+const TenBitBus kRxBus = {{"RXDATA", "RXRUNDISP", "RXCHARISK"},
+                          {"RX_DATA_WIDTH", "QVZ_RX_DATA_WIDTH"},
                           "RXDATA",
                           "RXDATA_OUT",
                           "O",
                           "_float",
                           false,
+                          true,
                           {"RXCHARISK_OUT", "RXCHARISK", "RXRUNDISP_OUT", "RXRUNDISP"}};
 
 // Maps the pin bits above `used` onto a spare signal of their own.
@@ -315,15 +310,13 @@ void MapSpareBits(Qvz_WizData* data, Qvz_Pin* pin, int used, const TenBitBus& bu
     pin->SetPinSigBitProp(name, pin->GetWidth() - 1, used, count - 1, 0);
 }
 
-} // namespace
-
-static void BuildTenBitBus(Qvz_MGTGeneralSetup& page, Qvz_WizData* data, Qvz_Block* block,
-                           const TenBitBus& bus) {
+void BuildTenBitBus(Qvz_MGTGeneralSetup& page, Qvz_WizData* data, Qvz_Block* block,
+                    const TenBitBus& bus) {
     if (!data || !block)
         return;
-    Qvz_Pin* dataPin = block->GetNamedPin(bus.dataPin);
-    Qvz_Pin* bit8Pin = block->GetNamedPin(bus.bit8Pin);
-    Qvz_Pin* bit9Pin = block->GetNamedPin(bus.bit9Pin);
+    Qvz_Pin* dataPin = block->GetNamedPin(bus.pins[0]);
+    Qvz_Pin* bit8Pin = block->GetNamedPin(bus.pins[1]);
+    Qvz_Pin* bit9Pin = block->GetNamedPin(bus.pins[2]);
     if (!dataPin || !bit8Pin || !bit9Pin)
         return;
     if (page.m_isGT11) {
@@ -331,8 +324,7 @@ static void BuildTenBitBus(Qvz_MGTGeneralSetup& page, Qvz_WizData* data, Qvz_Blo
         page.RestorePinWidth(bit8Pin);
         page.RestorePinWidth(bit9Pin);
     }
-    const int n =
-        DataWidthBytes(block->GetAttributeValue(page.m_isGT ? bus.widthGT : bus.widthOther));
+    const int n = DataWidthBytes(block->GetAttributeValue(bus.widthAttr[page.m_isGT ? 0 : 1]));
     if (n < 1)
         return; // no width to build a bus of
 
@@ -367,7 +359,7 @@ static void BuildTenBitBus(Qvz_MGTGeneralSetup& page, Qvz_WizData* data, Qvz_Blo
         if (i < bit9Pin->GetWidth())
             bit9Pin->SetPinSigBitProp(sigName, i, i, 10 * i + 9, 10 * i + 9);
     }
-    MapSpareBits(data, dataPin, 8 * n, bus, !bus.spareConstant0);
+    MapSpareBits(data, dataPin, 8 * n, bus, bus.dataSpareAlwaysBus);
     MapSpareBits(data, bit8Pin, n, bus, false);
     MapSpareBits(data, bit9Pin, n, bus, false);
 
@@ -375,6 +367,8 @@ static void BuildTenBitBus(Qvz_MGTGeneralSetup& page, Qvz_WizData* data, Qvz_Blo
         if (Qvz_Signal* s = data->GetNamedSignal(leftover))
             s->SetIsUsed(false);
 }
+
+} // namespace
 
 void Qvz_MGTGeneralSetup::BuildTxTenBitBus(Qvz_Block* block) {
     BuildTenBitBus(*this, m_pWizData, block, kTxBus);

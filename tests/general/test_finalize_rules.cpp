@@ -647,21 +647,6 @@ TEST(GroundFloatingInputs, TiesOnlyInputsConnectedToNothing) {
     EXPECT_EQ(bench.Of("H"), "tie 1");
 }
 
-TEST(PinLists, AnswerForTheirOwnNamesExactly) {
-    FinishBench bench(F::GT10, "");
-    Qvz_MGTGeneralSetup& page = bench.Page();
-    EXPECT_TRUE(page.IsInPcsPinList("RXCLKCORCNT"));
-    EXPECT_FALSE(page.IsInPcsPinList("RXCLKCORCNT2"));
-    EXPECT_TRUE(page.IsInRxExtraPinList("LOOPBACK"));
-    EXPECT_FALSE(page.IsInRxExtraPinList("loopback"));
-    EXPECT_TRUE(page.IsInUserClockPinList("TXUSRCLK2"));
-    EXPECT_FALSE(page.IsInUserClockPinList("TXUSRCLK3"));
-    EXPECT_TRUE(page.IsInTx64b66bPinList("TXGEARBOX64B66BUSE"));
-    EXPECT_FALSE(page.IsInTx64b66bPinList("RXDEC64B66BUSE"));
-    EXPECT_TRUE(page.IsInRx64b66bPinList("RXIGNOREBTF"));
-    EXPECT_FALSE(page.IsInRx64b66bPinList(""));
-}
-
 TEST(FinishSummary, TellsEveryOutcomeOfThePins) {
     FinishBench bench(F::GT10, "QVZ_CHAN_BOND_NUMBER=2;QVZ_TX_DATA_WIDTH=2");
     for (const char* pin : {"REFCLK/IN", "CONFIGIN/IN", "CONFIGOUT/OUT", "CHBONDO/OUT/5",
