@@ -38,9 +38,11 @@ Qvz_Summary Qvz_Summary::Of(const Qvz_WizData& data) {
             s.bitMapped.push_back(pin->GetName().ToQString());
         } else if (!pin->GetSigName().IsEmpty()) {
             const Qvz_Signal* sig = data.GetNamedSignal(pin->GetSigName());
-            if (sig && sig->IsExternal())
-                s.ports.push_back({pin->GetName().ToQString(), sig->GetName().ToQString(),
-                                   DirectionOf(*pin), pin->GetWidth()});
+            Port p{pin->GetName().ToQString(), pin->GetSigName().ToQString(), DirectionOf(*pin),
+                   pin->GetWidth()};
+            (sig && sig->IsExternal() ? s.ports : s.wired).push_back(p);
+        } else {
+            s.unconnected.push_back(pin->GetName().ToQString());
         }
     }
     for (const auto& sig : data.GetSignals())
@@ -79,6 +81,14 @@ QString Qvz_Summary::ToText(bool brief) const {
     if (!bitMapped.empty())
         lines << QString("Bit-wise:      %1")
                      .arg(QStringList(bitMapped.begin(), bitMapped.end()).join(", "));
+    if (!wired.empty())
+        lines << QString("Internal pins: %1").arg(wired.size());
+    if (!brief)
+        for (const auto& w : wired)
+            lines << QString("  %1 -> %2").arg(w.pin, w.signal);
+    lines << QString("Unconnected:   %1").arg(unconnected.size());
+    if (!brief && !unconnected.empty())
+        lines << "  " + QStringList(unconnected.begin(), unconnected.end()).join(", ");
     if (!brief && !internals.empty())
         lines << QString("Internal signals: %1")
                      .arg(QStringList(internals.begin(), internals.end()).join(", "));
@@ -157,6 +167,19 @@ QString Qvz_Summary::ToHtml(bool finished) const {
         h += "<p>" + QStringList(bitMapped.begin(), bitMapped.end()).join(", ").toHtmlEscaped() +
              "</p>";
     }
+    if (!wired.empty()) {
+        h += Heading("Pins on internal signals", wired.size());
+        h += "<table><tr><th>Pin</th><th>Signal</th></tr>";
+        for (const auto& w : wired)
+            h += "<tr>" + Cell(w.pin) + Cell(w.signal) + "</tr>";
+        h += "</table>";
+    }
+    h += Heading("Unconnected pins", unconnected.size());
+    h += unconnected.empty()
+             ? QString("<p>None.</p>")
+             : "<p>" +
+                   QStringList(unconnected.begin(), unconnected.end()).join(", ").toHtmlEscaped() +
+                   "</p>";
     h += Heading("Internal signals", internals.size());
     h += internals.empty()
              ? QString("<p>None.</p>")

@@ -33,6 +33,8 @@ struct Qvz_Summary {
     std::vector<Port> ports;
     std::vector<Tie> ties;
     std::vector<QString> bitMapped; // pins wired bit by bit
+    std::vector<Port> wired;        // pins on internal signals
+    std::vector<QString> unconnected;
     std::vector<QString> internals; // internal signals in use
     std::vector<Copy> copies;       // bonded copies of the block
 

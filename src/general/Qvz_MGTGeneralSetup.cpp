@@ -124,10 +124,6 @@ bool Qvz_MGTGeneralSetup::CreateGuiDlg(QWidget* parent) {
     return FinishGuiCreation(gui != nullptr);
 }
 
-bool Qvz_MGTGeneralSetup::FinalizePins() {
-    return true;
-}
-
 Qvz_Block* Qvz_MGTGeneralSetup::FindBlock() {
     Qvz_WizData* data = m_pWizData;
     if (!data)

@@ -13,6 +13,8 @@
 #include "Qvz_MGTWizPage.h"
 #include "Qvz_StrArray.h"
 
+#include <vector>
+
 class Qvz_MGTWizMain;
 class Wg_WizardPage;
 
@@ -49,8 +51,34 @@ public:
     void PruneGT10Attributes(Qvz_Block* block);
     void CleanUpGT11Attributes(Qvz_Block* block);
 
-    // Decides every pin of the active block at finish.
+    // Decides every pin of the active block at finish: ports, ties, bit-wise
+    // wiring or unconnected, then the 10-bit buses, the grounding of floating
+    // inputs and the bonded copies. False only when the bonded copies are due
+    // and there is no Channel Bonding page. Finishing again (after going back
+    // from the summary) first undoes what the last finish did to the pins.
     bool FinalizePins();
+
+    // Helpers of FinalizePins (Qvz_MGTFinalizePins.cpp).
+    // GT11: gives a data-width pin the width of the library "Custom" block's
+    // pin of that name for the current data width.
+    void RestorePinWidth(Qvz_Pin* pin);
+    bool IsInPcsPinList(const Port::StringBase& name) const;
+    bool IsInRxExtraPinList(const Port::StringBase& name) const;
+    bool IsInUserClockPinList(const Port::StringBase& name) const;
+    bool IsInTx64b66bPinList(const Port::StringBase& name) const;
+    bool IsInRx64b66bPinList(const Port::StringBase& name) const;
+    // Gather TXDATA/TXCHARDISPVAL/TXCHARDISPMODE (RXDATA/RXRUNDISP/RXCHARISK)
+    // into one bus of 10 bits per byte; nothing without all three pins.
+    void BuildTxTenBitBus(Qvz_Block* block);
+    void BuildRxTenBitBus(Qvz_Block* block);
+    // Ties the bits of a CRC data-width pin to the code of the CRC width.
+    void TieCrcDataWidth(Qvz_Block* block, Qvz_Pin* pin, bool tx);
+    // Ties to 0 every input that is still connected to nothing (not the
+    // GT11 tile bus, which the bonding step wires).
+    void GroundFloatingInputs(Qvz_Block* block);
+    // Connects the pin to an external signal of its own; dataWidth in bytes
+    // (below 1: unknown, the pin's own width is used).
+    void MakePinPort(Qvz_Pin* pin, int dataWidth);
 
     // Pin-name lists, filled by the constructor.
     Qvz_StrArray m_pcsPins;
@@ -110,4 +138,25 @@ private:
     bool IsBatch() const;
 
     Wg_WizardPage* m_pGui = nullptr;
+
+    // What the last finish found, so that finishing again starts from the
+    // pins as they were before it.
+    struct PinRecord {
+        Port::StringBase name;
+        Port::StringBase signal;
+        bool grounded = false;
+        bool vcc = false;
+        bool used = false;
+        std::vector<Qvz_NameValue> attributes;
+    };
+    struct FinishRecord {
+        Qvz_Block* block = nullptr;
+        std::vector<PinRecord> pins;
+        // Signals the finish put to use.
+        std::vector<Port::StringBase> activated;
+    };
+    FinishRecord m_lastFinish;
+    void UndoLastFinish();
+    void RecordBeforeFinish(Qvz_Block* block);
+    bool DecidePins(Qvz_Block* block);
 };

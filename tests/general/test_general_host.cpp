@@ -196,8 +196,9 @@ TEST(GeneralBatch, Gt11BlockGetsItsModeAndOldValueFormsConverted) {
     ASSERT_EQ(r.exitCode, 0) << r.err;
     ASSERT_TRUE(r.written);
     EXPECT_EQ(r.Messages(), Strings{});
-    EXPECT_EQ(r.Active(), Strings{"GT11_CUSTOM_INST"});
-    const Qvz_Block* b = r.Block("GT11_CUSTOM_INST");
+    // Finishing pairs every GT11 with the other transceiver of its tile.
+    EXPECT_EQ(r.Active(), (Strings{"GT11_CUSTOM_INST1", "GT11_CUSTOM_INST2"}));
+    const Qvz_Block* b = r.Block("GT11_CUSTOM_INST1");
     ExpectAttributes(b, {{"QVZ_RX_DATA_WIDTH", "2"},
                          {"QVZ_TX_DATA_WIDTH", "2"},
                          {"QVZ_GT11_MODE", "SINGLE"},
@@ -223,11 +224,12 @@ TEST(GeneralBatch, ObsoleteZephine8RunsAsZephine4) {
               Strings{"The primitive GT10_ZEPHINE_8 is obsolete.  The wizard will use "
                       "GT10_ZEPHINE_4 instead."});
     EXPECT_TRUE(r.AllNotes());
-    EXPECT_EQ(r.Active(), Strings{"GT10_ZEPHINE_4_INST"});
-    ExpectAttributes(r.Block("GT10_ZEPHINE_4_INST"), {{"QVZ_RX_DATA_WIDTH", "4"},
-                                                      {"SH_CNT_MAX", nullptr},
-                                                      {"COMMA_10B_MASK", "1111111111"},
-                                                      {"QVZ_CHAN_BOND_NUMBER", "2"}});
+    // Its bonding number of 2 gives it one bonded copy at finish.
+    EXPECT_EQ(r.Active(), (Strings{"GT10_ZEPHINE_4_INST1", "GT10_ZEPHINE_4_INST2"}));
+    ExpectAttributes(r.Block("GT10_ZEPHINE_4_INST1"), {{"QVZ_RX_DATA_WIDTH", "4"},
+                                                       {"SH_CNT_MAX", nullptr},
+                                                       {"COMMA_10B_MASK", "1111111111"},
+                                                       {"QVZ_CHAN_BOND_NUMBER", "2"}});
     // The obsolete block itself is not written.
     ExpectAttributes(r.Block("GT10_ZEPHINE_8_INST"),
                      {{"SH_CNT_MAX", "64"}, {"QVZ_BOOL_TX_USE", nullptr}});
