@@ -5,6 +5,8 @@
 #include "Qvz_MGTGeneralSetup.h"
 #include "Qvz_MGTWizMain.h"
 
+#include "TestApp.h"
+
 #include <QApplication>
 #include <QString>
 #include <QStringList>
@@ -14,11 +16,7 @@
 #include <vector>
 
 inline QApplication& App() {
-    static int argc = 1;
-    static char name[] = "test_general";
-    static char* argv[] = {name, nullptr};
-    static QApplication app(argc, argv);
-    return app;
+    return TestApp();
 }
 
 class TestPage : public Qvz_MGTGeneralSetup {

@@ -21,8 +21,15 @@ void ExpectOnlyChanges(const BatchRun& r, const std::map<std::string, std::strin
         const std::string actual = it != after.end() ? it->second : kDeleted;
         EXPECT_EQ(actual, expected) << name;
     }
-    for (const auto& [name, value] : after)
-        EXPECT_TRUE(before.count(name)) << "added: " << name;
+    for (const auto& [name, value] : after) {
+        auto change = changes.find(name);
+        if (before.count(name))
+            continue;
+        EXPECT_TRUE(change != changes.end()) << "added: " << name;
+        if (change != changes.end()) {
+            EXPECT_EQ(value, change->second) << name;
+        }
+    }
 }
 
 } // namespace
@@ -69,7 +76,9 @@ TEST(TransmitterBatch, Gt11BypassDisablesEncodingAndSizesLiterals) {
                           {"QVZX_ONLY_TX_8B10B_USE", kDeleted},
                           {"TX_BUFFER_USE", "TRUE"},
                           {"TXCRCINITVAL", "12'hABC"},
-                          {"TXPOST_TAP_DAC", "1'b1"}});
+                          {"TXPOST_TAP_DAC", "1'b1"},
+                          // Finishing places the pair's second transceiver.
+                          {"GT11_MODE", "B"}});
 }
 
 TEST(TransmitterBatch, EncodingResolutionTable) {
