@@ -1,6 +1,6 @@
 #include "Qvz_MGTRCB.h"
 
-#include "Qvz_PlaceholderGui.h"
+#include "Qvz_MGTRCBGui.h"
 #include "Qvz_WizMain.h"
 
 #include <QComboBox>
@@ -57,8 +57,10 @@ Qvz_MGTRCB::~Qvz_MGTRCB() = default;
 bool Qvz_MGTRCB::CreateGuiDlg(QWidget* parent) {
     if (!parent)
         return false;
-    m_pGui = new (std::nothrow) Qvz_PlaceholderGui("Receiver Channel Bonding Setup", parent);
-    return FinishGuiCreation(m_pGui != nullptr);
+    auto* gui = new (std::nothrow) Qvz_MGTRCBGui(this, parent);
+    m_pGui = gui;
+    SetView(gui);
+    return FinishGuiCreation(gui != nullptr);
 }
 
 bool Qvz_MGTRCB::DoBatchPage() {
@@ -356,8 +358,11 @@ bool Qvz_MGTRCB::WriteWizData(bool full) {
     set("CHAN_BOND_WAIT", m_waitText);
     set("CHAN_BOND_OFFSET", m_offsetText);
     QComboBox* seqLenCombo = GuiMode() ? m_pView->SeqLenComboBox() : nullptr;
-    set("CHAN_BOND_SEQ_LEN",
-        seqLenCombo ? StringBase::FromQString(seqLenCombo->currentText()) : m_seqLen);
+    // A list without items (no legal lengths) has no choice to write; the
+    // length read stays.
+    set("CHAN_BOND_SEQ_LEN", seqLenCombo && seqLenCombo->currentIndex() >= 0
+                                 ? StringBase::FromQString(seqLenCombo->currentText())
+                                 : m_seqLen);
     WriteBinary(block, "CHAN_BOND_SEQ_1_MASK", m_seq1Mask);
     WriteBinary(block, "CHAN_BOND_SEQ_2_MASK", m_seq2Mask);
     set("CHAN_BOND_SEQ_2_USE", m_seq2Use != 0 ? "TRUE" : "FALSE");
