@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QListWidget>
 #include <QPushButton>
+#include <QScrollArea>
 #include <QStackedWidget>
 #include <QStyle>
 #include <QVBoxLayout>
@@ -116,9 +117,31 @@ bool Wg_Wizard::addPage(Wg_WizardPage* page) {
         m_pages.append(entry);
     }
     if (QWidget* w = page->pageWidget())
-        m_stack->addWidget(w);
+        holderFor(w);
     updateChrome();
     return true;
+}
+
+QWidget* Wg_Wizard::shownForm() const {
+    QWidget* w = m_stack->currentWidget();
+    auto* area = qobject_cast<QScrollArea*>(w);
+    return area ? area->widget() : w;
+}
+
+QWidget* Wg_Wizard::holderFor(QWidget* form) {
+    // Each form scrolls on its own, so that the tallest page does not set the
+    // height of the dialog (or of every other page) on a small screen.
+    for (int i = 0; i < m_stack->count(); ++i)
+        if (auto* area = qobject_cast<QScrollArea*>(m_stack->widget(i)))
+            if (area->widget() == form)
+                return area;
+    auto* area = new QScrollArea(m_stack);
+    area->setObjectName("pageScrollArea");
+    area->setFrameShape(QFrame::NoFrame);
+    area->setWidgetResizable(true);
+    area->setWidget(form);
+    m_stack->addWidget(area);
+    return area;
 }
 
 void Wg_Wizard::enablePage(const QString& pageName, bool enable) {
@@ -220,11 +243,7 @@ void Wg_Wizard::showPage(int index) {
     }
     p->onActive();
     QWidget* w = p->pageWidget();
-    if (!w)
-        w = m_emptyPage;
-    else if (m_stack->indexOf(w) < 0)
-        m_stack->addWidget(w);
-    m_stack->setCurrentWidget(w);
+    m_stack->setCurrentWidget(w ? holderFor(w) : m_emptyPage);
     updateChrome();
     emit pageShown(index);
 }

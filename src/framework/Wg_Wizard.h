@@ -97,6 +97,14 @@ private:
 
     QLabel* m_title = nullptr;
     QListWidget* m_steps = nullptr;
+public:
+    // The form shown now (a page's widget, or an empty placeholder).
+    QWidget* shownForm() const;
+
+private:
+    // The scroll area that holds a page's form in the stack (made on first use).
+    QWidget* holderFor(QWidget* form);
+
     QStackedWidget* m_stack = nullptr;
     QWidget* m_emptyPage = nullptr;
     QPushButton* m_moreInfo = nullptr;

@@ -1,7 +1,7 @@
 #include "Qvz_MGTGeneralSetup.h"
 
+#include "Qvz_MGTGeneralSetupGui.h"
 #include "Qvz_MGTWizMain.h"
-#include "Qvz_PlaceholderGui.h"
 #include "Wg_Wizard.h"
 
 #include <climits>
@@ -117,8 +117,11 @@ bool Qvz_MGTGeneralSetup::DoBatchPage() {
 bool Qvz_MGTGeneralSetup::CreateGuiDlg(QWidget* parent) {
     if (!parent)
         return false;
-    m_pGui = new (std::nothrow) Qvz_PlaceholderGui("General Setup", parent);
-    return FinishGuiCreation(m_pGui != nullptr);
+    auto* gui = new (std::nothrow) Qvz_MGTGeneralSetupGui(this, parent);
+    m_pGui = gui;
+    if (gui)
+        gui->InitUIData();
+    return FinishGuiCreation(gui != nullptr);
 }
 
 bool Qvz_MGTGeneralSetup::FinalizePins() {

@@ -1,8 +1,8 @@
 #include "Qvz_MGTRX.h"
 
-#include "Qvz_PlaceholderGui.h"
+#include "Qvz_MGTRXGui.h"
+#include "Qvz_MGTRXWidget.h"
 #include "Qvz_WizMain.h"
-#include "Wg_WizardPage.h"
 
 #include <QComboBox>
 #include <QSpinBox>
@@ -51,8 +51,12 @@ bool Qvz_MGTRX::DoBatchPage() {
 bool Qvz_MGTRX::CreateGuiDlg(QWidget* parent) {
     if (!parent)
         return false;
-    m_pGui = new (std::nothrow) Qvz_PlaceholderGui("Receiver Setup", parent);
+    m_pGui = new (std::nothrow) Qvz_MGTRXGui(this, parent);
     return FinishGuiCreation(m_pGui != nullptr);
+}
+
+Wg_WizardPage* Qvz_MGTRX::GetGuiDlg() {
+    return m_pGui;
 }
 
 Port::StringBase Qvz_MGTRX::AfeEqDigits(const Port::StringBase& value) {
@@ -103,34 +107,37 @@ bool Qvz_MGTRX::ReadWizData() {
     if (const Qvz_Attribute* a = block->GetNamedAttribute("RXCRCINITVAL"))
         m_crcInitVal = StripSizedLiteral(a->GetValue(), 1);
 
-    if (InWindowRun())
-        GuiLoadComboBoxes(block);
+    Qvz_MGTRXGui* gui = Gui();
+    Qvz_MGTRXWidget* form = gui ? gui->Form() : nullptr;
+    if (gui)
+        gui->LoadComboBoxes(block);
 
     ReadDecoding(block);
 
     const struct {
         const char* attr;
-        const char* combo;
+        QComboBox* combo;
         Port::StringBase& field;
-    } choices[] = {{"RX_LOS_INVALID_INCR", "cbRXIncr", m_losInvalidIncr},
-                   {"RX_LOS_THRESHOLD", "cbRXThreshold", m_losThreshold},
-                   {"QVZ_RXCRC_DATAWIDTH", "cbRxCRCwidth", m_crcDataWidth}};
+    } choices[] = {{"RX_LOS_INVALID_INCR", form ? form->cbRXIncr : nullptr, m_losInvalidIncr},
+                   {"RX_LOS_THRESHOLD", form ? form->cbRXThreshold : nullptr, m_losThreshold},
+                   {"QVZ_RXCRC_DATAWIDTH", form ? form->cbRxCRCwidth : nullptr, m_crcDataWidth}};
     for (const auto& c : choices) {
         const Port::StringBase value = block->GetAttributeValue(c.attr);
         if (value.IsEmpty())
             continue;
         c.field = value;
-        if (InWindowRun())
-            SetFormCombo(c.combo, value);
+        if (c.combo)
+            SetComboBoxText(c.combo, value);
     }
 
-    ReadCounter(block, "SH_CNT_MAX", "sbSHMax", m_shCntMax, m_shCntMaxMin, m_shCntMaxMax,
-                m_shCntMaxText);
-    ReadCounter(block, "SH_INVALID_CNT_MAX", "sbSHInvalidMax", m_shInvalidCntMax,
-                m_shInvalidCntMaxMin, m_shInvalidCntMaxMax, m_shInvalidCntMaxText);
+    ReadCounter(block, "SH_CNT_MAX", form ? form->sbSHMax : nullptr, m_shCntMax, m_shCntMaxMin,
+                m_shCntMaxMax, m_shCntMaxText);
+    ReadCounter(block, "SH_INVALID_CNT_MAX", form ? form->sbSHInvalidMax : nullptr,
+                m_shInvalidCntMax, m_shInvalidCntMaxMin, m_shInvalidCntMaxMax,
+                m_shInvalidCntMaxText);
 
-    if (InWindowRun())
-        GuiUpdateData();
+    if (gui)
+        gui->UpdateData(false);
     return true;
 }
 
@@ -186,8 +193,8 @@ void Qvz_MGTRX::ReadDecoding(Qvz_Block* block) {
         m_decodingMode = kDecodingStatic;
 }
 
-void Qvz_MGTRX::ReadCounter(Qvz_Block* block, const char* attrName, const char* spinName,
-                            int32_t& value, int32_t& low, int32_t& high, Port::StringBase& text) {
+void Qvz_MGTRX::ReadCounter(Qvz_Block* block, const char* attrName, QSpinBox* spin, int32_t& value,
+                            int32_t& low, int32_t& high, Port::StringBase& text) {
     Qvz_Attribute* a = block->GetNamedAttribute(attrName);
     if (!a)
         return;
@@ -210,8 +217,10 @@ void Qvz_MGTRX::ReadCounter(Qvz_Block* block, const char* attrName, const char* 
     if (!IsDecimalNumber(a->GetValue()) && IsDecimalNumber(a->GetDefaultValue()))
         a->SetValue(a->GetDefaultValue());
     value = UT_STR::AToI(a->GetValue());
-    if (InWindowRun())
-        SetFormSpinBox(spinName, lo, hi, value);
+    if (spin) {
+        spin->setRange(lo, hi);
+        spin->setValue(value);
+    }
     text.Format("%d", static_cast<int>(value));
     low = lo;
     high = hi;
@@ -267,22 +276,4 @@ bool Qvz_MGTRX::WriteWizData() {
     SetIfPresent(block, "SH_INVALID_CNT_MAX", m_shInvalidCntMaxText);
     SetIfPresent(block, "RXAFEEQ", Port::StringBase(kAfeEqPrefix) + m_rxAfeEq);
     return true;
-}
-
-void Qvz_MGTRX::GuiLoadComboBoxes(Qvz_Block* /*block*/) {}
-
-void Qvz_MGTRX::GuiUpdateData() {}
-
-void Qvz_MGTRX::SetFormCombo(const char* objectName, const Port::StringBase& text) {
-    QWidget* form = m_pGui ? m_pGui->pageWidget() : nullptr;
-    if (QComboBox* combo = form ? form->findChild<QComboBox*>(objectName) : nullptr)
-        SetComboBoxText(combo, text);
-}
-
-void Qvz_MGTRX::SetFormSpinBox(const char* objectName, int low, int high, int value) {
-    QWidget* form = m_pGui ? m_pGui->pageWidget() : nullptr;
-    if (QSpinBox* spin = form ? form->findChild<QSpinBox*>(objectName) : nullptr) {
-        spin->setRange(low, high);
-        spin->setValue(value);
-    }
 }

@@ -7,7 +7,8 @@
 
 #include <cstdint>
 
-class QComboBox;
+class QSpinBox;
+class Qvz_MGTRXGui;
 class Wg_WizardPage;
 
 class Qvz_MGTRX : public Qvz_MGTWizPage {
@@ -17,7 +18,7 @@ public:
 
     bool DoBatchPage() override;
     bool CreateGuiDlg(QWidget* parent) override;
-    Wg_WizardPage* GetGuiDlg() override { return m_pGui; }
+    Wg_WizardPage* GetGuiDlg() override;
 
     // Active block into the fields (and, in a window run, into the form).
     bool ReadWizData();
@@ -65,25 +66,20 @@ public:
     // A whole decimal number: optional leading blanks and sign, then digits only.
     static bool IsDecimalNumber(const Port::StringBase& text);
 
+    // The page's controller, once CreateGuiDlg has made it.
+    Qvz_MGTRXGui* GuiDlg() const { return m_pGui; }
+
 private:
     void ReadDecoding(Qvz_Block* block);
     // Reads SH_CNT_MAX or SH_INVALID_CNT_MAX into its three fields and text.
-    void ReadCounter(Qvz_Block* block, const char* attrName, const char* spinName, int32_t& value,
+    void ReadCounter(Qvz_Block* block, const char* attrName, QSpinBox* spin, int32_t& value,
                      int32_t& low, int32_t& high, Port::StringBase& text);
     // False (with the range message) when text is no number within low..high.
     bool CheckCounter(const char* attrName, const Port::StringBase& text, int32_t low,
                       int32_t high);
 
-    // Window runs: the steps of a read that reach into the form. They find
-    // the controls by object name, so they act once the page's own form is
-    // in place and do nothing while a placeholder stands in for it.
-    bool InWindowRun() const { return !m_isBatch && m_pGui; }
-    // The controller's own steps (LoadComboBoxes, UpdateData(false)); the
-    // placeholder controller has no form for them to fill.
-    void GuiLoadComboBoxes(Qvz_Block* block);
-    void GuiUpdateData();
-    void SetFormCombo(const char* objectName, const Port::StringBase& text);
-    void SetFormSpinBox(const char* objectName, int low, int high, int value);
+    // The GUI side of a read; null in batch runs or before the controller exists.
+    Qvz_MGTRXGui* Gui() const { return m_isBatch ? nullptr : m_pGui; }
 
-    Wg_WizardPage* m_pGui = nullptr;
+    Qvz_MGTRXGui* m_pGui = nullptr;
 };

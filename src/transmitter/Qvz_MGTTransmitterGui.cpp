@@ -3,22 +3,6 @@
 #include "Qvz_MGTTXWidget.h"
 #include "Qvz_MGTTransmitter.h"
 
-namespace {
-
-// Shows and enables a label and its control by the row's attribute.
-void ApplyCrcRow(const Qvz_Attribute* attr, bool crcUse, QWidget* label, QWidget* control) {
-    QWidget* const widgets[2] = {label, control};
-    for (QWidget* w : widgets) {
-        if (!w)
-            continue;
-        w->setVisible(attr != nullptr);
-        if (attr)
-            w->setEnabled(crcUse && attr->IsEditable());
-    }
-}
-
-} // namespace
-
 Qvz_MGTTransmitterGui::Qvz_MGTTransmitterGui(Qvz_MGTTransmitter* page, QWidget* parent)
     : Qvz_MGTPageGui(page, parent, kEntryCount, "qvz_mgttx"), m_pPage(page) {
     m_pForm = new Qvz_MGTTXWidget(nullptr, nullptr, false, {});
@@ -187,18 +171,18 @@ void Qvz_MGTTransmitterGui::UpdateCrcControls() {
         f.cbCRC->setVisible(false);
     }
 
-    ApplyCrcRow(block->GetNamedAttribute("CRC_FORMAT"), crcUse, f.IDC_STATIC_CRC_FORMAT,
-                f.cbCRCFormat);
-    ApplyCrcRow(block->GetNamedAttribute("TX_CRC_FORCE_VALUE"), crcUse,
-                f.IDC_STATIC_TX_CRC_FORCE_VALUE, f.leCRCValue);
-    ApplyCrcRow(block->GetNamedAttribute("CRC_START_OF_PKT"), crcUse, f.IDC_STATIC_CRC_START_OF_PKT,
-                f.cbSOP);
-    ApplyCrcRow(block->GetNamedAttribute("CRC_END_OF_PKT"), crcUse, f.IDC_STATIC_CRC_END_OF_PKT,
-                f.cbEOP);
-    ApplyCrcRow(block->GetNamedAttribute("QVZ_TXCRC_DATAWIDTH"), crcUse, f.labelCRCwidth,
-                f.cbCRCwidth);
-    ApplyCrcRow(block->GetNamedAttribute("TXCRCCLOCKDOUBLE"), crcUse, nullptr, f.checkboxRatio);
-    ApplyCrcRow(block->GetNamedAttribute("TXCRCINITVAL"), crcUse, f.labelCRCinit, f.leCRCinit);
+    ApplyAttrRow(block->GetNamedAttribute("CRC_FORMAT"), crcUse,
+                 {f.IDC_STATIC_CRC_FORMAT, f.cbCRCFormat});
+    ApplyAttrRow(block->GetNamedAttribute("TX_CRC_FORCE_VALUE"), crcUse,
+                 {f.IDC_STATIC_TX_CRC_FORCE_VALUE, f.leCRCValue});
+    ApplyAttrRow(block->GetNamedAttribute("CRC_START_OF_PKT"), crcUse,
+                 {f.IDC_STATIC_CRC_START_OF_PKT, f.cbSOP});
+    ApplyAttrRow(block->GetNamedAttribute("CRC_END_OF_PKT"), crcUse,
+                 {f.IDC_STATIC_CRC_END_OF_PKT, f.cbEOP});
+    ApplyAttrRow(block->GetNamedAttribute("QVZ_TXCRC_DATAWIDTH"), crcUse,
+                 {f.labelCRCwidth, f.cbCRCwidth});
+    ApplyAttrRow(block->GetNamedAttribute("TXCRCCLOCKDOUBLE"), crcUse, {nullptr, f.checkboxRatio});
+    ApplyAttrRow(block->GetNamedAttribute("TXCRCINITVAL"), crcUse, {f.labelCRCinit, f.leCRCinit});
 }
 
 void Qvz_MGTTransmitterGui::UpdateEncodingControls(Qvz_Block* block) {

@@ -4,6 +4,7 @@
 #include "Qvz_WizMain.h"
 #include "Wg_Wizard.h"
 
+#include <QComboBox>
 #include <QRegularExpression>
 #include <QRegularExpressionValidator>
 
@@ -91,10 +92,9 @@ void Qvz_MGTPageGui::SetupEntry(int index, QLineEdit* lineEdit, const char* patt
 bool Qvz_MGTPageGui::CheckEntries() {
     for (const LEValidator& e : m_entries) {
         QLineEdit* le = e.m_pLineEdit;
-        // A hidden entry cannot be corrected by the user, so it must not hold
-        // the page either.
-        const bool hidden = le && le->parentWidget() && !le->isVisibleTo(le->window());
-        if (!le || !le->isEnabled() || hidden || le->hasAcceptableInput())
+        if (!le || !le->isEnabled() || le->hasAcceptableInput())
+            continue;
+        if (pageWidget() && !le->isVisibleTo(pageWidget()))
             continue;
         if (m_pBasePage)
             m_pBasePage->IssueMessage(e.m_message, false, false, false);
@@ -129,4 +129,15 @@ void Qvz_MGTPageGui::EnableMoreInfo() {
     Qvz_WizMain* main = m_pBasePage ? m_pBasePage->m_pWizMain : nullptr;
     if (main && main->m_pWizard)
         main->m_pWizard->enableMoreInfo(true);
+}
+
+void Qvz_MGTPageGui::ApplyAttrRow(const Qvz_Attribute* attr, bool on,
+                                  std::initializer_list<QWidget*> widgets) {
+    for (QWidget* w : widgets) {
+        if (!w)
+            continue;
+        w->setVisible(attr != nullptr);
+        if (attr)
+            w->setEnabled(on && attr->IsEditable());
+    }
 }

@@ -47,6 +47,7 @@
 #include <QComboBox>
 #include <QLineEdit>
 
+#include <initializer_list>
 #include <vector>
 
 class Qvz_Attribute;
@@ -116,7 +117,8 @@ protected:
                         Qt::UniqueConnection);
     }
     // The first enabled entry without acceptable input gets its message and
-    // the focus; false then.
+    // the focus; false then. Entries hidden in the form are passed over: the
+    // user could neither see the message's entry nor correct it.
     bool CheckEntries();
     // Clears combo and fills it with the attribute's legal values in order;
     // a null attribute leaves it empty.
@@ -127,6 +129,11 @@ protected:
     // The active block of the page's design data, or null.
     Qvz_Block* ActiveBlock() const;
     void EnableMoreInfo();
+
+    // The controls of one attribute: hidden when attr is absent, else shown
+    // and enabled when on and attr is editable. Null widgets are skipped.
+    static void ApplyAttrRow(const Qvz_Attribute* attr, bool on,
+                             std::initializer_list<QWidget*> widgets);
 
     std::vector<LEValidator> m_entries;
     Qvz_MGTWizPage* m_pBasePage = nullptr;

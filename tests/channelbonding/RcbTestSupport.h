@@ -10,14 +10,19 @@
 struct RcbRig {
     Qvz_WizData data;
     Qvz_MGTWizMain wiz{"test", false};
+    std::unique_ptr<Qvz_MGTRCB> owned;
     Qvz_MGTRCB* page = nullptr;
 
-    // Makes the pages afresh over data (target facts as they are now).
+    // Makes the bonding page afresh over data (target facts as they are now).
+    // Only this page: the General Setup page would clear the active block's
+    // pin signals and look the block up by type and width on construction.
     Qvz_MGTRCB* Start(Qvz_RunMode mode = Qvz_RunMode::Batch) {
         wiz.SetWizData(&data);
         wiz.SetRunMode(mode);
-        wiz.Prepare();
-        page = static_cast<Qvz_MGTRCB*>(wiz.GetPage(Qvz_MGTWizMain::kChannelBonding));
+        wiz.m_batchMode = mode == Qvz_RunMode::Batch;
+        owned.reset();
+        owned = std::make_unique<Qvz_MGTRCB>(&wiz);
+        page = owned.get();
         return page;
     }
     Qvz_Block* Block(const char* name, const char* primitive, bool used = true) {

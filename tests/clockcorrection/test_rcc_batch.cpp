@@ -94,7 +94,9 @@ TEST(RccBatchRun, Gt10ReplacesMasksThatDoNotFitTheLength) {
                  {"CLK_COR_SEQ_2_MASK", "1111"},
                  {"CLK_COR_SEQ_1_1", "00110111100"},
                  {"CLK_COR_SEQ_1_4", "00000000001"},
-                 {"CLK_COR_INSERT_IDLE_FLAG", "TRUE"},
+                 // General Setup deletes these from every GT10 block.
+                 {"CLK_COR_INSERT_IDLE_FLAG", "(absent)"},
+                 {"CLK_COR_KEEP_IDLE", "(absent)"},
                  {"CLK_COR_SEQ_DROP", "TRUE"},
                  {"CLK_COR_8B10B_DE", "FALSE"},
                  {"RX_BUFFER_USE", "TRUE"},

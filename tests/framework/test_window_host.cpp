@@ -77,7 +77,8 @@ TEST(WindowHost, ADesignFileOpensTheDialogToo) {
     TestApp();
     QTemporaryDir tmp;
     const QString out = tmp.filePath("out.json");
-    DialogDriver driver({[] { Click("buttonFinish"); }});
+    // Finish is refused on the first page until Next has chosen the block.
+    DialogDriver driver({[] { Click("buttonNext"); }, [] { Click("buttonFinish"); }});
     driver.Start();
     const int status = VelomuxHost::Run(
         {"velomux-wizard", QDir(VELOMUX_TARGETS).filePath("gt11.json"), "-o", out});

@@ -90,8 +90,7 @@ struct Fixture : AppFirst {
     QPushButton* Button(const char* name) { return wizard.findChild<QPushButton*>(name); }
     QString Current() const { return wizard.currentPage() ? wizard.currentPage()->pageName() : ""; }
     QString Shown() const {
-        auto* stack = wizard.findChild<QStackedWidget*>("pageStack");
-        auto* label = qobject_cast<QLabel*>(stack->currentWidget());
+        auto* label = qobject_cast<QLabel*>(wizard.shownForm());
         return label ? label->text() : "";
     }
 

@@ -179,7 +179,10 @@ TEST(GeneralBatch, Gt10BlockIsMigratedRenamedAndPruned) {
                          {"QVZX_ONLY_BREFCLK", nullptr},
                          {"SH_CNT_MAX", nullptr},
                          {"PMAVSEL", nullptr},
-                         {"CHAN_BOND_MODE", nullptr},
+                         {"CHAN_BOND_LIMIT", nullptr},
+                         // Pruned here; the bonding page's batch step then
+                         // writes "no bonding" into it.
+                         {"CHAN_BOND_MODE", "OFF"},
                          {"CLK_COR_SEQ_1_1", nullptr},
                          {"COMMA_10B_MASK", "1111111111"}});
     EXPECT_EQ(b->GetNamedPin("PMAPWRDN"), nullptr);

@@ -1,4 +1,6 @@
 #include "Qvz_MGTRX.h"
+#include "Qvz_MGTRXGui.h"
+#include "Qvz_MGTRXWidget.h"
 #include "Qvz_MGTWizMain.h"
 #include "TestApp.h"
 #include "Wg_WizardPage.h"
@@ -419,7 +421,7 @@ TEST(RxPage, WritesEveryAttributeTheBlockHas) {
     EXPECT_EQ(f.block->GetAttributes().size(), 1u);
 }
 
-TEST(RxPage, WindowRunWithoutItsFormReadsTheSameFields) {
+TEST(RxPage, WindowRunReadsTheSameFieldsAndFillsTheForm) {
     App();
     Fixture f({{"RX_LOS_THRESHOLD", "16"}, {"SH_CNT_MAX", "40"}});
     f.main.m_batchMode = false;
@@ -434,5 +436,6 @@ TEST(RxPage, WindowRunWithoutItsFormReadsTheSameFields) {
     EXPECT_FALSE(page.m_isBatch);
     EXPECT_EQ(page.m_losThreshold, "16");
     EXPECT_EQ(page.m_shCntMax, 40);
+    EXPECT_EQ(page.GuiDlg()->Form()->sbSHMax->value(), 40);
     EXPECT_TRUE(f.sink.messages.empty());
 }

@@ -48,17 +48,24 @@ TEST(TransmitterBatch, FibreChannelNeverTouchesThePacketCharacters) {
 
 TEST(TransmitterBatch, Gt10ReadsAndWritesCrcAndTapSettings) {
     BatchRun r = RunBatchOn("gt10_custom.json");
-    // The wizard's own CRC flag overrides the primitive's; the empty SOP gets
-    // the initial K27_7; a bare DAC gets its size. TX_PREEMPHASIS and
+    // General Setup prunes the primitive's own CRC attributes on GT10 before
+    // this page reads (their reading is checked on the page alone); the
+    // wizard's CRC settings stay; a bare DAC gets its size. TX_PREEMPHASIS and
     // TX_DIFF_CTRL belong to the first family and stay as they are.
-    ExpectOnlyChanges(
-        r, {{"TX_CRC_USE", "TRUE"}, {"CRC_START_OF_PKT", "K27_7"}, {"TXDAT_TAP_DAC", "5'b10101"}});
+    ExpectOnlyChanges(r, {{"TX_CRC_USE", kDeleted},
+                          {"CRC_FORMAT", kDeleted},
+                          {"CRC_START_OF_PKT", kDeleted},
+                          {"CRC_END_OF_PKT", kDeleted},
+                          {"TX_CRC_FORCE_VALUE", kDeleted},
+                          {"TXDAT_TAP_DAC", "5'b10101"}});
     EXPECT_TRUE(r.messages.empty());
 }
 
 TEST(TransmitterBatch, Gt11BypassDisablesEncodingAndSizesLiterals) {
     BatchRun r = RunBatchOn("gt11_custom.json");
-    ExpectOnlyChanges(r, {{"QVZX_ONLY_ENCODING", "DISABLE"},
+    // The transmit CRC is switched off by General Setup's PCS bypass resets.
+    ExpectOnlyChanges(r, {{"TX_CRC_USE", "FALSE"},
+                          {"QVZX_ONLY_ENCODING", "DISABLE"},
                           {"QVZX_ONLY_TX_8B10B_USE", kDeleted},
                           {"TX_BUFFER_USE", "TRUE"},
                           {"TXCRCINITVAL", "12'hABC"},

@@ -6,12 +6,10 @@
 using namespace txtest;
 
 TEST(TransmitterPage, WithoutDataOrBlock) {
-    Qvz_MGTWizMain main("w", false);
+    Qvz_MGTWizMain main("w", false); // no design data at all
     Qvz_RecordingSink sink;
     main.SetMessageSink(&sink);
-    main.Prepare();
-    auto* page = static_cast<Qvz_MGTTransmitter*>(main.GetPage(Qvz_MGTWizMain::kTransmitter));
-    ASSERT_NE(page, nullptr);
+    auto page = std::make_unique<Qvz_MGTTransmitter>(&main);
     EXPECT_FALSE(page->ReadWizData());
     EXPECT_FALSE(page->WriteWizData());
     EXPECT_FALSE(page->DoBatchPage());
@@ -111,6 +109,23 @@ TEST(TransmitterPage, UnlistedCrcFormatStaysInBatch) {
     Wizard w(d, Qvz_RunMode::Batch);
     EXPECT_TRUE(w.Page()->DoBatchPage());
     EXPECT_EQ(Value(d, "CRC_FORMAT"), "BOGUS");
+}
+
+TEST(TransmitterPage, Gt10CrcSettingsOfThePrimitive) {
+    // On the page alone (a whole run prunes these on GT10): the wizard's own
+    // CRC flag overrides the primitive's, an empty start of packet takes the
+    // initial K27_7, the rest is written back as read.
+    Qvz_WizData d = LoadFixture("gt10_custom.json");
+    Wizard w(d, Qvz_RunMode::Batch);
+    EXPECT_TRUE(w.Page()->DoBatchPage());
+    const std::map<std::string, std::string> expected = {{"TX_CRC_USE", "TRUE"},
+                                                         {"CRC_FORMAT", "INFINIBAND"},
+                                                         {"CRC_START_OF_PKT", "K27_7"},
+                                                         {"CRC_END_OF_PKT", "K28_0"},
+                                                         {"TX_CRC_FORCE_VALUE", "00001111"}};
+    for (const auto& [name, value] : expected)
+        EXPECT_EQ(Value(d, name.c_str()), value) << name;
+    EXPECT_TRUE(w.Messages().empty());
 }
 
 TEST(TransmitterPage, BooleansReadTrueOnlyForTRUE) {
