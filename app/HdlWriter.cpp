@@ -252,6 +252,7 @@ struct CompPort {
     QString name;
     QString dir;
     int width = 1;
+    int connected = 0; // instances that connect it
 };
 
 struct Component {
@@ -656,12 +657,16 @@ private:
             for (const PinConn& c : inst.pins) {
                 auto p = std::find_if(comp.ports.begin(), comp.ports.end(),
                                       [&](const CompPort& x) { return x.name == c.name; });
-                if (p == comp.ports.end())
+                if (p == comp.ports.end()) {
                     comp.ports.push_back({c.name, c.dir, c.width});
-                else if (p->dir != c.dir || p->width != c.width)
+                    p = comp.ports.end() - 1;
+                } else if (p->dir != c.dir || p->width != c.width) {
                     return Fail(QString("instance %1: pin %2 of %3 differs in direction or width "
                                         "from the same pin of another instance")
                                     .arg(inst.name, c.name, inst.primitive));
+                }
+                if (!c.pieces.empty())
+                    ++p->connected;
             }
         }
         return true;
@@ -966,8 +971,12 @@ QByteArray WriteVhdl(const Design& d) {
             t += "    port (\n";
             for (std::size_t i = 0; i < c.ports.size(); ++i) {
                 const CompPort& p = c.ports[i];
-                t += QString("      %1 : %2 %3%4\n")
-                         .arg(Pad(p.name, w), Pad(p.dir, 5), VhdlType(p.width > 1, p.width),
+                // VHDL-93 refuses an open input without a default.
+                const QString def = p.dir == "in" && p.connected < c.instances
+                                        ? (p.width > 1 ? " := (others => '0')" : " := '0'")
+                                        : "";
+                t += QString("      %1 : %2 %3%4%5\n")
+                         .arg(Pad(p.name, w), Pad(p.dir, 5), VhdlType(p.width > 1, p.width), def,
                               i + 1 < c.ports.size() ? ";" : "");
             }
             t += "    );\n";
