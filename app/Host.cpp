@@ -1,5 +1,6 @@
 #include "Host.h"
 
+#include "HdlWriter.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTWizMain.h"
 #include "Qvz_Summary.h"
@@ -21,9 +22,10 @@ namespace {
 const char* const kUsage =
     "Usage:\n"
     "  velomux-wizard [--batch] [--target NAME] [--type TYPE [--width N]] [--set NAME=VALUE]...\n"
-    "                 [-o FILE] [--report FILE] [DESIGN]\n"
-    "  velomux-wizard --check [--target NAME] [-o FILE] [DESIGN]\n"
-    "  velomux-wizard --list-targets | --help | --version\n";
+    "                 [-o FILE] [--report FILE] [HDL OPTIONS] [DESIGN]\n"
+    "  velomux-wizard --check [--target NAME] [-o FILE] [HDL OPTIONS] [DESIGN]\n"
+    "  velomux-wizard --list-targets | --help | --version\n"
+    "HDL OPTIONS: [--verilog FILE] [--vhdl FILE] [--constraints FILE] [--module NAME]\n";
 
 const char* const kHelp =
     "Configures one multi-gigabit serial transceiver of an FPGA design: reads design data\n"
@@ -49,7 +51,17 @@ const char* const kHelp =
     "                       output). Written only when the run completes, atomically.\n"
     "  --report FILE        write a JSON run report (outcome, failed page, messages).\n"
     "  --check              load and validate the design data, write it normalized to -o\n"
-    "                       if given; run no page.\n"
+    "                       if given; run no page. With the HDL options it generates the\n"
+    "                       design files from an already finished design.\n"
+    "  --verilog FILE       write a Verilog wrapper that instantiates the configured\n"
+    "                       transceiver(s): one port per external signal, ties, bit maps,\n"
+    "                       attributes as parameters.\n"
+    "  --vhdl FILE          write the same wrapper in VHDL (VHDL-93).\n"
+    "  --constraints FILE   write the placement (LOC) of each placed instance.\n"
+    "  --module NAME        name of the top module or entity (default: the target's file\n"
+    "                       name, else velomux_xcvr).\n"
+    "                       The design files are written like -o: only when the run\n"
+    "                       completes, atomically.\n"
     "  --list-targets       list the embedded sample targets.\n"
     "  -h, --help           show this help.\n"
     "  -v, --version        show the version.\n"
@@ -133,6 +145,13 @@ struct Options {
     QString output;
     QString report;
     QString design;
+    QString verilog;
+    QString vhdl;
+    QString constraints;
+    QString module;
+    bool WantsHdl() const {
+        return !verilog.isEmpty() || !vhdl.isEmpty() || !constraints.isEmpty();
+    }
 };
 
 bool LoadDesign(const Options& opt, Qvz_WizData& data, QString& error) {
@@ -180,6 +199,25 @@ bool ApplyChoices(const Options& opt, Qvz_MGTWizMain& wiz, Qvz_WizData& data, QS
     return true;
 }
 
+// Writes the design files asked for, each atomically.
+bool WriteHdl(const Options& opt, const HdlTexts& hdl, QString& error) {
+    const std::pair<const QString*, const QByteArray*> files[] = {
+        {&opt.verilog, &hdl.verilog}, {&opt.vhdl, &hdl.vhdl}, {&opt.constraints, &hdl.constraints}};
+    for (const auto& f : files)
+        if (!f.first->isEmpty() && !WriteAtomically(*f.first, *f.second, error))
+            return false;
+    return true;
+}
+
+void PrintHdlFiles(const Options& opt) {
+    if (!opt.verilog.isEmpty())
+        Out() << "Verilog:       " << opt.verilog << "\n";
+    if (!opt.vhdl.isEmpty())
+        Out() << "VHDL:          " << opt.vhdl << "\n";
+    if (!opt.constraints.isEmpty())
+        Out() << "Constraints:   " << opt.constraints << "\n";
+}
+
 int ListTargets() {
     for (const auto& t : kTargets)
         Out() << QString("%1  %2\n").arg(t.name, -5).arg(t.description);
@@ -194,8 +232,12 @@ int Parse(const QStringList& args, Options& opt) {
     const QCommandLineOption help(QStringList{"h", "help"}), version(QStringList{"v", "version"});
     const QCommandLineOption target("target", "", "NAME"), type("type", "", "TYPE");
     const QCommandLineOption width("width", "", "N"), set("set", "", "NAME=VALUE");
-    const QCommandLineOption output(QStringList{"o", "output"}, "", "FILE"), report("report", "", "FILE");
-    p.addOptions({batch, check, list, help, version, target, type, width, set, output, report});
+    const QCommandLineOption output(QStringList{"o", "output"}, "", "FILE"),
+        report("report", "", "FILE");
+    const QCommandLineOption verilog("verilog", "", "FILE"), vhdl("vhdl", "", "FILE");
+    const QCommandLineOption constraints("constraints", "", "FILE"), module("module", "", "NAME");
+    p.addOptions({batch, check, list, help, version, target, type, width, set, output, report,
+                  verilog, vhdl, constraints, module});
     if (!p.parse(args))
         return UsageError(p.errorText());
     if (p.isSet(help)) {
@@ -208,7 +250,8 @@ int Parse(const QStringList& args, Options& opt) {
     }
     if (p.isSet(list))
         return ListTargets();
-    for (const QCommandLineOption* single : {&target, &type, &width, &output, &report})
+    for (const QCommandLineOption* single :
+         {&target, &type, &width, &output, &report, &verilog, &vhdl, &constraints, &module})
         if (p.values(*single).size() > 1)
             return UsageError(QString("--%1 given more than once").arg(single->names().last()));
     opt.batch = p.isSet(batch);
@@ -223,15 +266,20 @@ int Parse(const QStringList& args, Options& opt) {
     opt.sets = p.values(set);
     opt.output = p.value(output);
     opt.report = p.value(report);
+    opt.verilog = p.value(verilog);
+    opt.vhdl = p.value(vhdl);
+    opt.constraints = p.value(constraints);
+    opt.module = p.value(module);
     const QStringList pos = p.positionalArguments();
     if (pos.size() > 1)
         return UsageError("give at most one design-data file");
     if (!pos.isEmpty())
         opt.design = pos.first();
 
-    if (opt.check && (opt.batch || p.isSet(type) || opt.widthGiven || !opt.sets.isEmpty() ||
-                      p.isSet(report)))
-        return UsageError("--check takes only --target, -o and a design-data file");
+    if (opt.check &&
+        (opt.batch || p.isSet(type) || opt.widthGiven || !opt.sets.isEmpty() || p.isSet(report)))
+        return UsageError(
+            "--check takes only --target, -o, the HDL options and a design-data file");
     if (p.isSet(type) && opt.type.isEmpty())
         return UsageError("--type needs a transceiver type");
     if (opt.widthGiven && opt.type.isEmpty())
@@ -245,6 +293,26 @@ int Parse(const QStringList& args, Options& opt) {
         return UsageError("-o needs a file name");
     if (p.isSet(report) && opt.report.isEmpty())
         return UsageError("--report needs a file name");
+    for (const QCommandLineOption* file : {&verilog, &vhdl, &constraints})
+        if (p.isSet(*file) && p.value(*file).isEmpty())
+            return UsageError(QString("--%1 needs a file name").arg(file->names().last()));
+    if (p.isSet(module) && !opt.WantsHdl())
+        return UsageError("--module goes with --verilog, --vhdl or --constraints");
+    if (p.isSet(module) && !IsHdlIdentifier(opt.module))
+        return UsageError(QString("--module \"%1\": give a plain identifier (a letter, then "
+                                  "letters, digits and single underscores) that is no keyword "
+                                  "of Verilog or VHDL")
+                              .arg(opt.module));
+    // Two outputs on one file (or both on standard output) would overwrite or interleave.
+    QStringList files;
+    for (const QString& f : {opt.output, opt.report, opt.verilog, opt.vhdl, opt.constraints}) {
+        if (f.isEmpty())
+            continue;
+        const QString key = f == "-" ? f : QFileInfo(f).absoluteFilePath();
+        if (files.contains(key))
+            return UsageError(QString("\"%1\" is given for two outputs").arg(f));
+        files << key;
+    }
     if (opt.targetGiven && !opt.design.isEmpty())
         return UsageError("give either --target or a design-data file, not both");
     if (opt.design.isEmpty()) {
@@ -288,16 +356,27 @@ int Run(const QStringList& args) {
     if (!LoadDesign(opt, data, error))
         return InputError(error);
 
-    const bool toStdout = opt.output == "-";
+    const bool toStdout =
+        opt.output == "-" || opt.verilog == "-" || opt.vhdl == "-" || opt.constraints == "-";
     if (opt.check) {
-        if (!opt.output.isEmpty() && !WriteAtomically(opt.output, Qvz_DesignJson::Save(data), error)) {
+        HdlTexts hdl;
+        if (opt.WantsHdl() && !GenerateHdl(data, opt.module, VELOMUX_VERSION, hdl, error))
+            return InputError(error);
+        if (!opt.output.isEmpty() &&
+            !WriteAtomically(opt.output, Qvz_DesignJson::Save(data), error)) {
             Err() << "velomux-wizard: " << error << "\n";
             return kExitOutput;
         }
-        if (!toStdout)
+        if (!WriteHdl(opt, hdl, error)) {
+            Err() << "velomux-wizard: " << error << "\n";
+            return kExitOutput;
+        }
+        if (!toStdout) {
             Out() << QString("Design data is valid: %1 block(s), %2 signal(s).\n")
                          .arg(data.GetBlocks().size())
                          .arg(data.GetSignals().size());
+            PrintHdlFiles(opt);
+        }
         return kExitCompleted;
     }
 
@@ -323,8 +402,20 @@ int Run(const QStringList& args) {
     wiz.SetRunMode(mode);
     int status = wiz.Run() == Qvz_RunCompleted ? kExitCompleted : kExitRefused;
 
+    // The design files come from the finished data; when they cannot be made,
+    // nothing at all is written, so the outputs never disagree.
+    HdlTexts hdl;
+    if (status == kExitCompleted && opt.WantsHdl() &&
+        !GenerateHdl(data, opt.module, VELOMUX_VERSION, hdl, error)) {
+        Err() << "velomux-wizard: " << error << "\n";
+        status = kExitInput;
+    }
     if (status == kExitCompleted && !opt.output.isEmpty() &&
         !WriteAtomically(opt.output, Qvz_DesignJson::Save(data), error)) {
+        Err() << "velomux-wizard: " << error << "\n";
+        status = kExitOutput;
+    }
+    if (status == kExitCompleted && !WriteHdl(opt, hdl, error)) {
         Err() << "velomux-wizard: " << error << "\n";
         status = kExitOutput;
     }
@@ -342,8 +433,9 @@ int Run(const QStringList& args) {
                       : "velomux-wizard: cancelled; nothing written.\n");
     if (status == kExitCompleted && !toStdout) {
         Out() << Qvz_Summary::Of(data).ToText(true);
-        Out() << "Output:        " << (opt.output.isEmpty() ? QString("(none; use -o FILE)") : opt.output)
-              << "\n";
+        Out() << "Output:        "
+              << (opt.output.isEmpty() ? QString("(none; use -o FILE)") : opt.output) << "\n";
+        PrintHdlFiles(opt);
     }
     Out().flush();
     Err().flush();

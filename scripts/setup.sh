@@ -3,7 +3,7 @@
 # nothing for packages that are already there).
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config qt6-base-dev qt6-base-dev-tools libgtest-dev
-          libgmock-dev libbenchmark-dev xvfb xauth)
+          libgmock-dev libbenchmark-dev xvfb xauth iverilog verilator ghdl)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")
