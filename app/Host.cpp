@@ -306,7 +306,9 @@ int Parse(const QStringList& args, Options& opt) {
     // Two outputs on one file (or both on standard output) would overwrite or interleave.
     QStringList files;
     for (const QString& f : {opt.output, opt.report, opt.verilog, opt.vhdl, opt.constraints}) {
-        if (f.isEmpty())
+        // Devices such as /dev/null may take several outputs.
+        if (f.isEmpty() || (f != "-" && QFileInfo(f).exists() && !QFileInfo(f).isFile() &&
+                            !QFileInfo(f).isDir()))
             continue;
         const QString key = f == "-" ? f : QFileInfo(f).absoluteFilePath();
         if (files.contains(key))
