@@ -38,8 +38,9 @@ Qvz_Summary Qvz_Summary::Of(const Qvz_WizData& data) {
             s.bitMapped.push_back(pin->GetName().ToQString());
         } else if (!pin->GetSigName().IsEmpty()) {
             const Qvz_Signal* sig = data.GetNamedSignal(pin->GetSigName());
+            // The port is as wide as its signal (a 64-bit pin may use 32 bits).
             Port p{pin->GetName().ToQString(), pin->GetSigName().ToQString(), DirectionOf(*pin),
-                   pin->GetWidth()};
+                   sig ? sig->GetWidth() : pin->GetWidth()};
             (sig && sig->IsExternal() ? s.ports : s.wired).push_back(p);
         } else {
             s.unconnected.push_back(pin->GetName().ToQString());

@@ -12,7 +12,8 @@ void MakeFinished(Qvz_WizData& d) {
     m->AddAttribute("QVZ_RX_DATA_WIDTH", "2");
     m->AddAttribute("LOC", "GT10_X5Y1");
     m->AddAttribute("CHAN_BOND_MODE", "MASTER");
-    m->AddPin("TXDATA", "IN")->SetWidth(16);
+    // A 32-bit pin of which the port uses 16 bits: the port is told as wide as its signal.
+    m->AddPin("TXDATA", "IN")->SetWidth(32);
     m->GetNamedPin("TXDATA")->SetSigName("TXDATA_IN");
     m->AddPin("RXDATA", "OUT")->SetWidth(16);
     m->GetNamedPin("RXDATA")->SetSigName("RXDATA_OUT");
@@ -29,8 +30,8 @@ void MakeFinished(Qvz_WizData& d) {
     d.AddBlock(std::move(m));
     d.AddBlock(std::move(copy));
     d.AddBlock(std::move(idle));
-    d.AddSignal("TXDATA_IN", true, "I");
-    d.AddSignal("RXDATA_OUT", true, "O");
+    d.AddSignal("TXDATA_IN", true, "I")->SetIsBus(true, 16);
+    d.AddSignal("RXDATA_OUT", true, "O")->SetIsBus(true, 16);
     d.AddSignal("RXCHARISK_INT", false, "");
     d.AddSignal("STALE", false, "")->SetIsUsed(false);
 }

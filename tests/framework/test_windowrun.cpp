@@ -92,7 +92,7 @@ protected:
     bool DoFinishAtSummaryStart() override {
         ++enters;
         if (Qvz_Block* b = GetWizData()->GetActiveBlock()) {
-            GetWizData()->AddSignal("TXDATA_IN", true, "I");
+            GetWizData()->AddSignal("TXDATA_IN", true, "I")->SetIsBus(true, 32);
             b->GetNamedPin("TXDATA")->SetSigName("TXDATA_IN");
         }
         return enterAnswer;
