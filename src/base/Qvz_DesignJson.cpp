@@ -10,6 +10,8 @@
 
 #include <cmath>
 #include <initializer_list>
+#include <string>
+#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -75,9 +77,15 @@ qsizetype FindDuplicateKey(const QByteArray& text, QString& key) {
             }
             if (!stack.empty() && stack.back().isObject && stack.back().expectKey) {
                 stack.back().expectKey = false;
-                // Decode escapes the way the parser will, so "a" and "\u0061" match.
-                const QJsonDocument d = QJsonDocument::fromJson("[\"" + raw + "\"]");
-                const QString k = d.isArray() ? d.array().at(0).toString() : QString::fromUtf8(raw);
+                // Decode escapes the way the parser will, so "a" and "\u0061" match
+                // (only keys with escapes need the parser).
+                QString k;
+                if (raw.contains('\\')) {
+                    const QJsonDocument d = QJsonDocument::fromJson("[\"" + raw + "\"]");
+                    k = d.isArray() ? d.array().at(0).toString() : QString::fromUtf8(raw);
+                } else {
+                    k = QString::fromUtf8(raw);
+                }
                 if (stack.back().keys.contains(k)) {
                     key = k;
                     return start;
@@ -322,21 +330,27 @@ void ReadRoot(const QJsonObject& root, Qvz_WizData& data) {
         Fail("$.format", "expected \"velomux-design-data\"");
     IntAt(root, "version", "$", 1, 1, 1);
     ReadTarget(root, data.Target());
+    // Names are checked against a set: a lookup in the design data per item
+    // would make reading big designs quadratic.
+    std::unordered_set<std::string> names;
     const QJsonArray blocks = ArrayAt(root, "blocks", "$");
+    names.reserve(std::size_t(blocks.size()));
     for (qsizetype i = 0; i < blocks.size(); ++i) {
         const QString p = QString("$.blocks[%1]").arg(i);
         auto b = ReadBlock(AsObject(blocks.at(i), p), p);
-        const QString name = b->GetName().ToQString();
-        if (!data.AddBlock(std::move(b)))
-            Fail(p + ".name", "duplicate block name " + Quote(name));
+        if (!names.insert(b->GetName().str()).second)
+            Fail(p + ".name", "duplicate block name " + Quote(b->GetName().ToQString()));
+        data.AppendNewBlock(std::move(b));
     }
+    names.clear();
     const QJsonArray sigs = ArrayAt(root, "signals", "$");
+    names.reserve(std::size_t(sigs.size()));
     for (qsizetype i = 0; i < sigs.size(); ++i) {
         const QString p = QString("$.signals[%1]").arg(i);
         auto s = ReadSignal(AsObject(sigs.at(i), p), p);
-        if (data.GetNamedSignal(s->GetName()))
+        if (!names.insert(s->GetName().str()).second)
             Fail(p + ".name", "duplicate signal name " + Quote(s->GetName().ToQString()));
-        data.AddSignal(*s);
+        data.AppendNewSignal(std::move(s));
     }
 }
 
@@ -346,9 +360,22 @@ class Writer {
 public:
     QByteArray out;
 
+    // Text is written as UTF-8; bytes that are not (a host's Latin-1 name, a
+    // name cut inside a character) become U+FFFD, so that what is saved can
+    // always be read back.
+    static std::string Utf8(const std::string& s) {
+        bool ascii = true;
+        for (unsigned char c : s)
+            ascii = ascii && c < 0x80;
+        if (ascii)
+            return s;
+        const QByteArray bytes = QString::fromUtf8(s.data(), qsizetype(s.size())).toUtf8();
+        return std::string(bytes.constData(), std::size_t(bytes.size()));
+    }
+
     void Str(const StringBase& s) {
         out += '"';
-        for (unsigned char c : s.str()) {
+        for (unsigned char c : Utf8(s.str())) {
             switch (c) {
             case '"':
                 out += "\\\"";
