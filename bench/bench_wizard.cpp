@@ -11,6 +11,7 @@
 #include "Qvz_WizPage.h"
 
 #include <QCoreApplication>
+#include <QFile>
 #include <QString>
 
 #include <benchmark/benchmark.h>
@@ -67,6 +68,20 @@ struct BatchWizard {
             if (!wiz.GetPage(i)->DoBatchPage())
                 return false;
         return true;
+    }
+};
+
+// A fresh copy of the design data and a wizard over it for each iteration;
+// the previous ones are destroyed here, while the timing is paused, rather
+// than at the end of the timed iteration.
+struct Fresh {
+    std::unique_ptr<BatchWizard> run;
+    std::unique_ptr<Qvz_WizData> data;
+    BatchWizard& Make(const Qvz_WizData& base) {
+        run.reset();
+        data = std::make_unique<Qvz_WizData>(base);
+        run = std::make_unique<BatchWizard>(*data);
+        return *run;
     }
 };
 
@@ -130,10 +145,10 @@ Qvz_WizData ManyPins(int n) {
 void BM_FinishManyPins(benchmark::State& state) {
     const Qvz_WizData base = ManyPins(int(state.range(0)));
     int result = 0;
+    Fresh fresh;
     for (auto _ : state) {
         state.PauseTiming();
-        Qvz_WizData data = base;
-        BatchWizard run(data);
+        BatchWizard& run = fresh.Make(base);
         const bool pagesOk = run.RunPages();
         state.ResumeTiming();
         result = pagesOk ? run.wiz.FinishRun() : Qvz_RunRefused;
@@ -176,10 +191,11 @@ void BM_BondedInstances(benchmark::State& state) {
     const Qvz_WizData& base = Target(int(state.range(0)));
     const int n = ActiveFamilyMax(base);
     std::size_t blocksAfter = 0;
+    Fresh fresh;
     for (auto _ : state) {
         state.PauseTiming();
-        Qvz_WizData data = base;
-        BatchWizard run(data);
+        BatchWizard& run = fresh.Make(base);
+        Qvz_WizData& data = *fresh.data;
         Qvz_Block* block = data.GetActiveBlock();
         if (block && block->GetNamedAttribute("QVZ_CHAN_BOND_NUMBER"))
             block->SetAttributeValue("QVZ_CHAN_BOND_NUMBER", std::to_string(n).c_str());
@@ -286,11 +302,11 @@ void BM_ScaledSave(benchmark::State& state) {
 void BM_ScaledBatchRun(benchmark::State& state) {
     const Qvz_WizData& base = ScaledCached(int(state.range(0)));
     int result = 0;
+    Fresh fresh;
     for (auto _ : state) {
         state.PauseTiming();
-        Qvz_WizData data = base;
+        BatchWizard& run = fresh.Make(base);
         state.ResumeTiming();
-        BatchWizard run(data);
         result = run.wiz.Run();
         benchmark::DoNotOptimize(result);
     }
@@ -312,9 +328,26 @@ VELOMUX_SCALED(BM_ScaledBatchRun);
 
 } // namespace
 
+// --write-scaled DIR: writes the scaled designs as scaled-N.json files, so
+// that scripts/bench-floor.sh can run the program on them.
+int WriteScaled(const QString& dir) {
+    for (int factor : {1, 10, 100, 1000}) {
+        QFile f(QString("%1/scaled-%2.json").arg(dir).arg(factor));
+        const QByteArray text = Qvz_DesignJson::Save(Scaled(factor));
+        if (!f.open(QIODevice::WriteOnly) || f.write(text) != text.size()) {
+            std::fprintf(stderr, "velomux_bench: %s: %s\n", qPrintable(f.fileName()),
+                         qPrintable(f.errorString()));
+            return 1;
+        }
+    }
+    return 0;
+}
+
 int main(int argc, char** argv) {
     // As in the host's batch runs: a core application, no display.
     QCoreApplication app(argc, argv);
+    if (argc == 3 && std::string(argv[1]) == "--write-scaled")
+        return WriteScaled(QString::fromLocal8Bit(argv[2]));
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 1;
