@@ -6,11 +6,14 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QJsonParseError>
-#include <QSet>
 
+#include <algorithm>
 #include <cmath>
+#include <cstddef>
+#include <deque>
 #include <initializer_list>
 #include <string>
+#include <string_view>
 #include <unordered_set>
 #include <utility>
 #include <vector>
@@ -44,57 +47,81 @@ std::pair<int, int> LineColumn(const QByteArray& text, qsizetype offset) {
 }
 
 // QJsonDocument keeps only one of two equal keys; find such keys first.
-// Returns the offset of the second occurrence, or -1.
+// Returns the offset of the earliest second occurrence, or -1. Each object's
+// keys are sorted when it closes, in one buffer shared by all objects: no
+// allocation per key or object, which big designs would feel.
 qsizetype FindDuplicateKey(const QByteArray& text, QString& key) {
+    struct Key {
+        std::string_view name; // decoded
+        qsizetype offset;
+    };
     struct Frame {
         bool isObject;
         bool expectKey;
-        QSet<QString> keys;
+        std::size_t firstKey; // in keys
     };
     std::vector<Frame> stack;
+    std::vector<Key> keys;           // the keys of the open objects, innermost last
+    std::deque<std::string> decoded; // keys that held escapes
+    qsizetype found = -1;
+    const auto close = [&]() {
+        const Frame f = stack.back();
+        stack.pop_back();
+        if (!f.isObject)
+            return;
+        const auto first = keys.begin() + std::ptrdiff_t(f.firstKey);
+        std::sort(first, keys.end(), [](const Key& a, const Key& b) {
+            return a.name != b.name ? a.name < b.name : a.offset < b.offset;
+        });
+        for (auto it = first; it != keys.end() && it + 1 != keys.end(); ++it) {
+            if (it->name == (it + 1)->name && (found < 0 || (it + 1)->offset < found)) {
+                found = (it + 1)->offset;
+                key = QString::fromUtf8(it->name.data(), qsizetype(it->name.size()));
+            }
+        }
+        keys.erase(first, keys.end());
+    };
+    const char* const data = text.constData();
     const qsizetype n = text.size();
     for (qsizetype i = 0; i < n; ++i) {
-        const char c = text[i];
+        const char c = data[i];
         if (c == '{') {
-            stack.push_back({true, true, {}});
+            stack.push_back({true, true, keys.size()});
         } else if (c == '[') {
-            stack.push_back({false, false, {}});
+            stack.push_back({false, false, keys.size()});
         } else if (c == '}' || c == ']') {
             if (!stack.empty())
-                stack.pop_back();
+                close();
         } else if (c == ',') {
             if (!stack.empty() && stack.back().isObject)
                 stack.back().expectKey = true;
         } else if (c == '"') {
             const qsizetype start = i;
-            QByteArray raw;
-            for (++i; i < n && text[i] != '"'; ++i) {
-                if (text[i] == '\\' && i + 1 < n) {
-                    raw += text[i];
+            bool escaped = false;
+            for (++i; i < n && data[i] != '"'; ++i) {
+                if (data[i] == '\\' && i + 1 < n) {
+                    escaped = true;
                     ++i;
                 }
-                raw += text[i];
             }
             if (!stack.empty() && stack.back().isObject && stack.back().expectKey) {
                 stack.back().expectKey = false;
-                // Decode escapes the way the parser will, so "a" and "\u0061" match
-                // (only keys with escapes need the parser).
-                QString k;
-                if (raw.contains('\\')) {
+                std::string_view name(data + start + 1, std::size_t(i - start - 1));
+                if (escaped) {
+                    // Decode escapes the way the parser will, so "a" and "\u0061" match.
+                    const QByteArray raw(name.data(), qsizetype(name.size()));
                     const QJsonDocument d = QJsonDocument::fromJson("[\"" + raw + "\"]");
-                    k = d.isArray() ? d.array().at(0).toString() : QString::fromUtf8(raw);
-                } else {
-                    k = QString::fromUtf8(raw);
+                    decoded.push_back(
+                        (d.isArray() ? d.array().at(0).toString().toUtf8() : raw).toStdString());
+                    name = decoded.back();
                 }
-                if (stack.back().keys.contains(k)) {
-                    key = k;
-                    return start;
-                }
-                stack.back().keys.insert(k);
+                keys.push_back({name, start});
             }
         }
     }
-    return -1;
+    while (!stack.empty())
+        close();
+    return found;
 }
 
 QString Quote(const QString& s) {

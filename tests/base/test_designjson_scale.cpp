@@ -111,3 +111,28 @@ TEST(DesignJsonText, EscapedAndPlainKeysAreTheSameKey) {
         "in.json", d, err))
         << err.toStdString();
 }
+
+TEST(DesignJsonText, TheEarliestRepeatedKeyIsReported) {
+    const struct {
+        const char* text;
+        const char* mustContain;
+    } cases[] = {
+        // The outer object's repeat comes first, though the inner object closes first.
+        {"{\"format\": 1, \"format\": 2, \"target\": {\"file_name\": 1,\n\"file_name\": 2}}",
+         "in.json:1:15: duplicate key \"format\""},
+        {"{\"target\": {\"file_name\": 1,\n\"file_name\": 2}, \"format\": 1, \"format\": 2}",
+         "in.json:2:1: duplicate key \"file_name\""},
+        {"{\"a\": 1, \"b\": 2, \"a\": 3, \"a\": 4}", "in.json:1:18: duplicate key \"a\""},
+        {"[{\"x\": 1}, {\"x\": 2}, {\"y\": 1, \"\\u0079\": 2}]",
+         "in.json:1:31: duplicate key \"y\""},
+        {"{\"k\": {\"k\": {\"k\": 1}}, \"v\": [\"v\", \"v\"], \"w\": 1,\n \"w\": 2}",
+         "in.json:2:2: duplicate key \"w\""},
+    };
+    for (const auto& c : cases) {
+        Qvz_WizData d;
+        QString err;
+        EXPECT_FALSE(Qvz_DesignJson::Load(c.text, "in.json", d, err)) << c.text;
+        EXPECT_TRUE(err.contains(c.mustContain))
+            << err.toStdString() << "\nexpected " << c.mustContain;
+    }
+}
