@@ -6,12 +6,17 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QJsonParseError>
-#include <QSet>
 
+#include <algorithm>
 #include <cerrno>
 #include <cmath>
+#include <cstddef>
 #include <cstring>
+#include <deque>
 #include <initializer_list>
+#include <string>
+#include <string_view>
+#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -51,51 +56,81 @@ std::pair<int, int> LineColumn(const QByteArray& text, qsizetype offset) {
 }
 
 // QJsonDocument keeps only one of two equal keys; find such keys first.
-// Returns the offset of the second occurrence, or -1.
+// Returns the offset of the earliest second occurrence, or -1. Each object's
+// keys are sorted when it closes, in one buffer shared by all objects: no
+// allocation per key or object, which big designs would feel.
 qsizetype FindDuplicateKey(const QByteArray& text, QString& key) {
+    struct Key {
+        std::string_view name; // decoded
+        qsizetype offset;
+    };
     struct Frame {
         bool isObject;
         bool expectKey;
-        QSet<QString> keys;
+        std::size_t firstKey; // in keys
     };
     std::vector<Frame> stack;
+    std::vector<Key> keys;           // the keys of the open objects, innermost last
+    std::deque<std::string> decoded; // keys that held escapes
+    qsizetype found = -1;
+    const auto close = [&]() {
+        const Frame f = stack.back();
+        stack.pop_back();
+        if (!f.isObject)
+            return;
+        const auto first = keys.begin() + std::ptrdiff_t(f.firstKey);
+        std::sort(first, keys.end(), [](const Key& a, const Key& b) {
+            return a.name != b.name ? a.name < b.name : a.offset < b.offset;
+        });
+        for (auto it = first; it != keys.end() && it + 1 != keys.end(); ++it) {
+            if (it->name == (it + 1)->name && (found < 0 || (it + 1)->offset < found)) {
+                found = (it + 1)->offset;
+                key = QString::fromUtf8(it->name.data(), qsizetype(it->name.size()));
+            }
+        }
+        keys.erase(first, keys.end());
+    };
+    const char* const data = text.constData();
     const qsizetype n = text.size();
     for (qsizetype i = 0; i < n; ++i) {
-        const char c = text[i];
+        const char c = data[i];
         if (c == '{') {
-            stack.push_back({true, true, {}});
+            stack.push_back({true, true, keys.size()});
         } else if (c == '[') {
-            stack.push_back({false, false, {}});
+            stack.push_back({false, false, keys.size()});
         } else if (c == '}' || c == ']') {
             if (!stack.empty())
-                stack.pop_back();
+                close();
         } else if (c == ',') {
             if (!stack.empty() && stack.back().isObject)
                 stack.back().expectKey = true;
         } else if (c == '"') {
             const qsizetype start = i;
-            QByteArray raw;
-            for (++i; i < n && text[i] != '"'; ++i) {
-                if (text[i] == '\\' && i + 1 < n) {
-                    raw += text[i];
+            bool escaped = false;
+            for (++i; i < n && data[i] != '"'; ++i) {
+                if (data[i] == '\\' && i + 1 < n) {
+                    escaped = true;
                     ++i;
                 }
-                raw += text[i];
             }
             if (!stack.empty() && stack.back().isObject && stack.back().expectKey) {
                 stack.back().expectKey = false;
-                // Decode escapes the way the parser will, so "a" and "\u0061" match.
-                const QJsonDocument d = QJsonDocument::fromJson("[\"" + raw + "\"]");
-                const QString k = d.isArray() ? d.array().at(0).toString() : QString::fromUtf8(raw);
-                if (stack.back().keys.contains(k)) {
-                    key = k;
-                    return start;
+                std::string_view name(data + start + 1, std::size_t(i - start - 1));
+                if (escaped) {
+                    // Decode escapes the way the parser will, so "a" and "\u0061" match.
+                    const QByteArray raw(name.data(), qsizetype(name.size()));
+                    const QJsonDocument d = QJsonDocument::fromJson("[\"" + raw + "\"]");
+                    decoded.push_back(
+                        (d.isArray() ? d.array().at(0).toString().toUtf8() : raw).toStdString());
+                    name = decoded.back();
                 }
-                stack.back().keys.insert(k);
+                keys.push_back({name, start});
             }
         }
     }
-    return -1;
+    while (!stack.empty())
+        close();
+    return found;
 }
 
 QString Quote(const QString& s) {
@@ -331,21 +366,27 @@ void ReadRoot(const QJsonObject& root, Qvz_WizData& data) {
         Fail("$.format", "expected \"velomux-design-data\"");
     IntAt(root, "version", "$", 1, 1, 1);
     ReadTarget(root, data.Target());
+    // Names are checked against a set: a lookup in the design data per item
+    // would make reading big designs quadratic.
+    std::unordered_set<std::string> names;
     const QJsonArray blocks = ArrayAt(root, "blocks", "$");
+    names.reserve(std::size_t(blocks.size()));
     for (qsizetype i = 0; i < blocks.size(); ++i) {
         const QString p = QString("$.blocks[%1]").arg(i);
         auto b = ReadBlock(AsObject(blocks.at(i), p), p);
-        const QString name = b->GetName().ToQString();
-        if (!data.AddBlock(std::move(b)))
-            Fail(p + ".name", "duplicate block name " + Quote(name));
+        if (!names.insert(b->GetName().str()).second)
+            Fail(p + ".name", "duplicate block name " + Quote(b->GetName().ToQString()));
+        data.AppendNewBlock(std::move(b));
     }
+    names.clear();
     const QJsonArray sigs = ArrayAt(root, "signals", "$");
+    names.reserve(std::size_t(sigs.size()));
     for (qsizetype i = 0; i < sigs.size(); ++i) {
         const QString p = QString("$.signals[%1]").arg(i);
         auto s = ReadSignal(AsObject(sigs.at(i), p), p);
-        if (data.GetNamedSignal(s->GetName()))
+        if (!names.insert(s->GetName().str()).second)
             Fail(p + ".name", "duplicate signal name " + Quote(s->GetName().ToQString()));
-        data.AddSignal(*s);
+        data.AppendNewSignal(std::move(s));
     }
 }
 
@@ -355,9 +396,22 @@ class Writer {
 public:
     QByteArray out;
 
+    // Text is written as UTF-8; bytes that are not (a host's Latin-1 name, a
+    // name cut inside a character) become U+FFFD, so that what is saved can
+    // always be read back.
+    static std::string Utf8(const std::string& s) {
+        bool ascii = true;
+        for (unsigned char c : s)
+            ascii = ascii && c < 0x80;
+        if (ascii)
+            return s;
+        const QByteArray bytes = QString::fromUtf8(s.data(), qsizetype(s.size())).toUtf8();
+        return std::string(bytes.constData(), std::size_t(bytes.size()));
+    }
+
     void Str(const StringBase& s) {
         out += '"';
-        for (unsigned char c : s.str()) {
+        for (unsigned char c : Utf8(s.str())) {
             switch (c) {
             case '"':
                 out += "\\\"";

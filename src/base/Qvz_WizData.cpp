@@ -292,6 +292,13 @@ Qvz_Block* Qvz_WizData::AddBlock(std::unique_ptr<Qvz_Block> block) {
     return m_blocks.back().get();
 }
 
+Qvz_Block* Qvz_WizData::AppendNewBlock(std::unique_ptr<Qvz_Block> block) {
+    if (!block)
+        return nullptr;
+    m_blocks.push_back(std::move(block));
+    return m_blocks.back().get();
+}
+
 Qvz_Block* Qvz_WizData::GetActiveBlock() const {
     for (const auto& b : m_blocks)
         if (b->IsUsed())
@@ -356,6 +363,13 @@ Qvz_Signal* Qvz_WizData::AddSignal(const Qvz_Signal& signal) {
         return s;
     }
     m_signals.push_back(std::make_unique<Qvz_Signal>(signal));
+    return m_signals.back().get();
+}
+
+Qvz_Signal* Qvz_WizData::AppendNewSignal(std::unique_ptr<Qvz_Signal> signal) {
+    if (!signal)
+        return nullptr;
+    m_signals.push_back(std::move(signal));
     return m_signals.back().get();
 }
 

@@ -265,6 +265,10 @@ public:
     const std::vector<std::unique_ptr<Qvz_Block>>& GetBlocks() const { return m_blocks; }
     // Appends a block; returns it (null when the name exists).
     Qvz_Block* AddBlock(std::unique_ptr<Qvz_Block> block);
+    // Appends without looking the name up, for readers that have already
+    // made sure every name is new (a lookup per item makes big designs
+    // quadratic to read). Returns the block.
+    Qvz_Block* AppendNewBlock(std::unique_ptr<Qvz_Block> block);
     Qvz_Block* GetActiveBlock() const;
     Qvz_Block* GetNamedBlock(const StringBase& name) const;
     Qvz_Block* GetPrimitiveBlock(const StringBase& primitive) const;
@@ -281,6 +285,9 @@ public:
     Qvz_Signal* AddSignal(const StringBase& name, bool external, const StringBase& direction);
     // Adds a copy; an existing name is marked used and returned instead.
     Qvz_Signal* AddSignal(const Qvz_Signal& signal);
+    // Appends without looking the name up (see AppendNewBlock); the signal
+    // keeps its own flags. Returns the signal.
+    Qvz_Signal* AppendNewSignal(std::unique_ptr<Qvz_Signal> signal);
     void DeleteSignal(Qvz_Signal* signal);
     void SetAllSigsIsActive(bool b);
 
