@@ -1,9 +1,14 @@
 #include "Qvz_MGTRCD.h"
 
+#include <algorithm>
+#include <cctype>
+
 #include "Qvz_MGTRCDGui.h"
 #include "Qvz_MGTRCDWidget.h"
 #include "Qvz_WizMain.h"
 
+#include <algorithm>
+#include <cctype>
 #include <new>
 
 namespace {
@@ -28,9 +33,17 @@ void SetIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& va
         a->SetValue(value);
 }
 
+bool IsHexText(const Port::StringBase& text) {
+    return std::all_of(text.str().begin(), text.str().end(),
+                       [](unsigned char c) { return std::isxdigit(c) != 0; });
+}
+
 // Exactly n digits: leading zeros added, or only the low-order n kept (all
-// an attribute of that width can hold).
+// an attribute of that width can hold). Text that is not hexadecimal is left
+// whole: cutting it could split a character and corrupt the design data.
 Port::StringBase FitDigits(const Port::StringBase& digits, std::size_t n) {
+    if (!IsHexText(digits))
+        return digits;
     if (digits.GetLength() >= n)
         return digits.Right(n);
     Port::StringBase out(std::string(n - digits.GetLength(), '0'));

@@ -101,6 +101,11 @@ TEST(CommaDetect, ReadCommaValueByFamily) {
         {"GT11_CUSTOM", "10'h17C", false, "17C"},
         {"GT11_CUSTOM", "10'h3FF", false, "3FF"},
         {"GT11_CUSTOM", "x'hAB'hCD", false, "AB'hCD"},
+        // Text that is not hexadecimal is never cut (a cut could split a
+        // multi-byte character): it stays whole for the user to see.
+        {"GT11_CUSTOM", "32'h\xc3\xa9\xc3\xa9\xc3\xa9\xc3\xa9" "10'h17C", true,
+         "\xc3\xa9\xc3\xa9\xc3\xa9\xc3\xa9" "10'h17C"},
+        {"GT11_CUSTOM", "32'hGG", true, "GG"},
         // Binary families: ten binary digits, kept as they are.
         {"GT10_CUSTOM", "0011111000", true, "0011111000"},
         {"GT_CUSTOM", "0011111000", false, "0011111000"},
