@@ -32,15 +32,6 @@ bool Is(const StringBase& s, const char* text) {
     return s.Compare(text, Port::CompareExact) == 0;
 }
 
-bool AllDigits(const StringBase& s) {
-    if (s.IsEmpty())
-        return false;
-    for (char c : s.str())
-        if (!UT_STR::IsDigit(static_cast<unsigned char>(c)))
-            return false;
-    return true;
-}
-
 StringBase Numbered(const StringBase& base, const char* infix, int i) {
     StringBase s = base;
     s += infix;
@@ -113,25 +104,11 @@ StringBase Qvz_MGTRCB::GetLaneId(int index) const {
 StringBase Qvz_MGTRCB::ReadBinary(Qvz_Attribute* attr, bool resetIfLocked) const {
     if (resetIfLocked && !attr->IsEditable())
         attr->SetValue(attr->GetDefaultValue());
-    const StringBase value = attr->GetValue();
-    const std::size_t marker = value.GetIndexOfString("'b", Port::CompareSearch);
-    if (marker == StringBase::npos)
-        return value;
-    const StringBase digits = value.Mid(marker + 2);
-    const StringBase size = value.Left(marker);
-    // A size that is no number, or claims more digits than there are, would
-    // pull the size prefix itself into the field.
-    if (!AllDigits(size))
-        return digits;
-    const int n = UT_STR::AToI(size);
-    if (static_cast<std::size_t>(n) > digits.GetLength())
-        return digits;
-    return value.Right(static_cast<std::size_t>(n));
+    return GetBinaryValue(attr);
 }
 
 void Qvz_MGTRCB::WriteBinary(Qvz_Block* block, const char* name, const StringBase& digits) const {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(m_isGT11 ? GetSizedLiteral(digits, 0) : digits);
+    SetBinaryValue(block->GetNamedAttribute(name), digits, m_isGT11);
 }
 
 void Qvz_MGTRCB::ReadRange(Qvz_Block* block, const char* name, int lowStart, int highStart,

@@ -32,15 +32,6 @@ const char* BoolText(bool b) {
     return b ? "TRUE" : "FALSE";
 }
 
-bool IsAllDigits(const Port::StringBase& s) {
-    if (s.IsEmpty())
-        return false;
-    for (char c : s.str())
-        if (!UT_STR::IsDigit(static_cast<unsigned char>(c)))
-            return false;
-    return true;
-}
-
 } // namespace
 
 Qvz_MGTRCC::Qvz_MGTRCC(Qvz_WizMain* main) : Qvz_MGTWizPage(main) {}
@@ -63,32 +54,6 @@ bool Qvz_MGTRCC::CreateGuiDlg(QWidget* parent) {
 
 Wg_WizardPage* Qvz_MGTRCC::GetGuiDlg() {
     return m_pGui;
-}
-
-Port::StringBase Qvz_MGTRCC::GetBinaryValue(const Qvz_Attribute* attr) {
-    if (!attr)
-        return Port::StringBase();
-    const Port::StringBase& value = attr->GetValue();
-    const std::size_t pos = value.GetIndexOfString("'b", Port::CompareSearch);
-    if (pos == Port::StringBase::npos)
-        return value;
-    // The size says how many trailing digits count. A size that is no number,
-    // or one larger than the digits present, would take part of the size and
-    // marker (or read before the text): keep the digits after the marker.
-    const Port::StringBase digits = value.Mid(pos + 2);
-    const Port::StringBase size = value.Left(pos);
-    if (!IsAllDigits(size))
-        return digits;
-    const int n = UT_STR::AToI(size);
-    if (static_cast<std::size_t>(n) > digits.GetLength())
-        return digits;
-    return value.Right(static_cast<std::size_t>(n));
-}
-
-void Qvz_MGTRCC::SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits) const {
-    if (!attr)
-        return;
-    attr->SetValue(m_isGT11 ? GetSizedLiteral(digits, 0) : digits);
 }
 
 void Qvz_MGTRCC::ReadNumber(Qvz_Block* block, const char* name, Qvz_MGTRCCView::SpinBoxId spin,
@@ -328,11 +293,11 @@ bool Qvz_MGTRCC::WriteWizData() {
     WriteIfPresent(block, "CLK_COR_SEQ_LEN", m_seqLength);
     WriteIfPresent(block, "CLK_COR_SEQ_2_USE", BoolText(m_seq2Use == 1));
     for (int i = 0; i < 4; ++i)
-        SetBinaryValue(block->GetNamedAttribute(kSeq1Names[i]), m_seq1[i]);
+        SetBinaryValue(block->GetNamedAttribute(kSeq1Names[i]), m_seq1[i], m_isGT11);
     for (int i = 0; i < 4; ++i)
-        SetBinaryValue(block->GetNamedAttribute(kSeq2Names[i]), m_seq2[i]);
-    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_1_MASK"), m_seq1Mask);
-    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_2_MASK"), m_seq2Mask);
+        SetBinaryValue(block->GetNamedAttribute(kSeq2Names[i]), m_seq2[i], m_isGT11);
+    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_1_MASK"), m_seq1Mask, m_isGT11);
+    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_2_MASK"), m_seq2Mask, m_isGT11);
     WriteIfPresent(block, "CLK_COR_MIN_LAT", m_minLat);
     WriteIfPresent(block, "CLK_COR_MAX_LAT", m_maxLat);
     WriteIfPresent(block, "CLK_COR_SEQ_DROP", BoolText(m_seqDrop != 0));
