@@ -13,8 +13,6 @@ using Port::StringBase;
 
 namespace {
 
-const char* const kDataError = "Tessel Wizard internal data error.";
-
 // The eight sequence characters, in the order of m_seq.
 const char* const kSeqAttrs[Qvz_MGTRCB::kSeqCount] = {
     "CHAN_BOND_SEQ_1_1", "CHAN_BOND_SEQ_1_2", "CHAN_BOND_SEQ_1_3", "CHAN_BOND_SEQ_1_4",
@@ -325,8 +323,7 @@ bool Qvz_MGTRCB::WriteWizData(bool full) {
         return false;
 
     auto set = [block](const char* name, const StringBase& value) {
-        if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-            a->SetValue(value);
+        SetIfPresent(block, name, value);
     };
     set("QVZ_CHAN_BOND_PRIMARY_ROW", m_primaryRowBottom == 0 ? "1" : "0");
     set("CHAN_BOND_ONE_SHOT", m_allowRepeat != 0 ? "FALSE" : "TRUE");

@@ -24,10 +24,6 @@ const EntryPatterns kEntries[Qvz_MGTRCDGui::kEntryCount] = {
      "Please enter a valid 10-bit binary value for Comma Mask"},
 };
 
-bool IsTrue(const Qvz_Block* block, const char* name) {
-    return block->GetAttributeValue(name).Compare("TRUE", Port::CompareExact) == 0;
-}
-
 // Present and editable.
 bool Editable(const Qvz_Attribute* attribute) {
     return attribute && attribute->IsEditable();
@@ -150,7 +146,7 @@ void Qvz_MGTRCDGui::UpdateControls() {
         return;
     Qvz_MGTRCDWidget& f = *m_pForm;
     const bool off = m_pPage->m_turnOffComma != 0;
-    const bool bypass = IsTrue(block, "QVZX_ONLY_BYPASS_PCS");
+    const bool bypass = Qvz_MGTWizPage::IsTrue(block, "QVZX_ONLY_BYPASS_PCS");
 
     const struct {
         QWidget* group;

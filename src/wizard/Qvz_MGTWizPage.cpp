@@ -53,6 +53,20 @@ bool Qvz_MGTWizPage::GetGT10EncodingChoices(Qvz_Block* block, bool& allowNone, b
     return unchanged;
 }
 
+bool Qvz_MGTWizPage::IsTrue(const Port::StringBase& value) {
+    return value.Compare("TRUE", Port::CompareExact) == 0;
+}
+
+bool Qvz_MGTWizPage::IsTrue(const Qvz_Block* block, const char* name) {
+    return block && IsTrue(block->GetAttributeValue(name));
+}
+
+void Qvz_MGTWizPage::SetIfPresent(Qvz_Block* block, const char* name,
+                                  const Port::StringBase& value) {
+    if (Qvz_Attribute* a = block ? block->GetNamedAttribute(name) : nullptr)
+        a->SetValue(value);
+}
+
 bool Qvz_MGTWizPage::IsAllDigits(const Port::StringBase& s) {
     if (s.IsEmpty())
         return false;

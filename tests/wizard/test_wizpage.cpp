@@ -75,6 +75,25 @@ TEST(BinaryValue, DigitsTestAndSizedWrites) {
     Qvz_MGTWizPage::SetBinaryValue(nullptr, "1", true); // no attribute: nothing to write
 }
 
+TEST(AttributeFlags, ReadTrueOnlyAndWriteOnlyPresent) {
+    Qvz_Block b("GT_CUSTOM", "GT_CUSTOM", Qvz_Family::GT);
+    b.AddAttribute("ON", "TRUE");
+    b.AddAttribute("LOWER", "true");
+    b.AddAttribute("OFF", "FALSE");
+    EXPECT_TRUE(Qvz_MGTWizPage::IsTrue(&b, "ON"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "LOWER"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "OFF"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "MISSING"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(nullptr, "ON"));
+
+    Qvz_MGTWizPage::SetIfPresent(&b, "OFF", Qvz_MGTWizPage::BoolText(true));
+    Qvz_MGTWizPage::SetIfPresent(&b, "MISSING", "TRUE");
+    Qvz_MGTWizPage::SetIfPresent(nullptr, "OFF", "FALSE");
+    EXPECT_EQ(b.GetAttributeValue("OFF"), "TRUE");
+    EXPECT_EQ(b.GetNamedAttribute("MISSING"), nullptr);
+    EXPECT_STREQ(Qvz_MGTWizPage::BoolText(false), "FALSE");
+}
+
 namespace {
 
 struct EncodingCase {
