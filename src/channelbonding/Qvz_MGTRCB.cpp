@@ -174,12 +174,7 @@ Qvz_MGTRCB::ReadResult Qvz_MGTRCB::Read() {
     const bool gui = GuiMode();
     QComboBox* seqLenCombo = gui ? m_pView->SeqLenComboBox() : nullptr;
     Qvz_Attribute* seqLen = block->GetNamedAttribute("CHAN_BOND_SEQ_LEN");
-    if (seqLenCombo) {
-        seqLenCombo->clear();
-        if (seqLen)
-            for (const StringBase& v : seqLen->GetLegalValues().Items())
-                seqLenCombo->addItem(v.ToQString());
-    }
+    Qvz_MGTPageGui::FillComboBox(seqLenCombo, seqLen);
 
     m_allowRepeat = Is(block->GetAttributeValue("CHAN_BOND_ONE_SHOT"), "TRUE") ? 0 : 1;
     if (Qvz_Attribute* use2 = block->GetNamedAttribute("CHAN_BOND_SEQ_2_USE")) {
@@ -334,9 +329,9 @@ bool Qvz_MGTRCB::WriteWizData(bool full) {
     QComboBox* seqLenCombo = GuiMode() ? m_pView->SeqLenComboBox() : nullptr;
     // A list without items (no legal lengths) has no choice to write; the
     // length read stays.
-    set("CHAN_BOND_SEQ_LEN", seqLenCombo && seqLenCombo->currentIndex() >= 0
-                                 ? StringBase::FromQString(seqLenCombo->currentText())
-                                 : m_seqLen);
+    StringBase seqLen = m_seqLen;
+    Qvz_MGTPageGui::ReadComboBox(seqLenCombo, seqLen);
+    set("CHAN_BOND_SEQ_LEN", seqLen);
     WriteBinary(block, "CHAN_BOND_SEQ_1_MASK", m_seq1Mask);
     WriteBinary(block, "CHAN_BOND_SEQ_2_MASK", m_seq2Mask);
     set("CHAN_BOND_SEQ_2_USE", m_seq2Use != 0 ? "TRUE" : "FALSE");
