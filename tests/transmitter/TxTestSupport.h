@@ -3,6 +3,7 @@
 // the page in either mode, and batch runs of the program.
 
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTTransmitter.h"
 #include "Qvz_MGTWizMain.h"
@@ -49,12 +50,7 @@ struct Wizard {
         page = std::make_unique<Qvz_MGTTransmitter>(&main);
     }
     Qvz_MGTTransmitter* Page() const { return page.get(); }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
+    std::vector<std::string> Messages() const { return MessageTexts(sink); }
     Qvz_RecordingSink sink;
     Qvz_MGTWizMain main;
     std::unique_ptr<Qvz_MGTTransmitter> page;
