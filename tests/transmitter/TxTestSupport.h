@@ -116,14 +116,14 @@ struct BatchRun {
 // Runs the program in batch mode on doc and collects its output and report.
 inline BatchRun RunBatch(const QJsonObject& doc) {
     QTemporaryDir tmp;
-    const QString in = tmp.filePath("in.json"), out = tmp.filePath("out.json"),
-                  report = tmp.filePath("report.json");
+    const QString in = tmp.filePath("in.json");
     EXPECT_TRUE(WriteAll(in, QJsonDocument(doc).toJson()));
+    const BatchOutcome run = RunBatchHost(in);
     BatchRun r;
     r.input = doc;
-    r.exitCode = RunHost({"--batch", "-o", out, "--report", report, in}).exitCode;
-    r.output = ReadJson(out);
-    r.report = ReadJson(report);
+    r.exitCode = run.host.exitCode;
+    r.output = run.output;
+    r.report = run.report;
     for (const QJsonValue& m : r.report["messages"].toArray())
         r.messages.push_back(m.toObject()["text"].toString().toStdString());
     return r;
