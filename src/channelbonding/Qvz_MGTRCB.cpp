@@ -13,8 +13,6 @@ using Port::StringBase;
 
 namespace {
 
-const char* const kDataError = "Tessel Wizard internal data error.";
-
 // The eight sequence characters, in the order of m_seq.
 const char* const kSeqAttrs[Qvz_MGTRCB::kSeqCount] = {
     "CHAN_BOND_SEQ_1_1", "CHAN_BOND_SEQ_1_2", "CHAN_BOND_SEQ_1_3", "CHAN_BOND_SEQ_1_4",
@@ -30,15 +28,6 @@ bool Has(const StringBase& s, const char* text) {
 
 bool Is(const StringBase& s, const char* text) {
     return s.Compare(text, Port::CompareExact) == 0;
-}
-
-bool AllDigits(const StringBase& s) {
-    if (s.IsEmpty())
-        return false;
-    for (char c : s.str())
-        if (!UT_STR::IsDigit(static_cast<unsigned char>(c)))
-            return false;
-    return true;
 }
 
 StringBase Numbered(const StringBase& base, const char* infix, int i) {
@@ -113,25 +102,11 @@ StringBase Qvz_MGTRCB::GetLaneId(int index) const {
 StringBase Qvz_MGTRCB::ReadBinary(Qvz_Attribute* attr, bool resetIfLocked) const {
     if (resetIfLocked && !attr->IsEditable())
         attr->SetValue(attr->GetDefaultValue());
-    const StringBase value = attr->GetValue();
-    const std::size_t marker = value.GetIndexOfString("'b", Port::CompareSearch);
-    if (marker == StringBase::npos)
-        return value;
-    const StringBase digits = value.Mid(marker + 2);
-    const StringBase size = value.Left(marker);
-    // A size that is no number, or claims more digits than there are, would
-    // pull the size prefix itself into the field.
-    if (!AllDigits(size))
-        return digits;
-    const int n = UT_STR::AToI(size);
-    if (static_cast<std::size_t>(n) > digits.GetLength())
-        return digits;
-    return value.Right(static_cast<std::size_t>(n));
+    return GetBinaryValue(attr);
 }
 
 void Qvz_MGTRCB::WriteBinary(Qvz_Block* block, const char* name, const StringBase& digits) const {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(m_isGT11 ? GetSizedLiteral(digits, 0) : digits);
+    SetBinaryValue(block->GetNamedAttribute(name), digits, m_isGT11);
 }
 
 void Qvz_MGTRCB::ReadRange(Qvz_Block* block, const char* name, int lowStart, int highStart,
@@ -199,12 +174,7 @@ Qvz_MGTRCB::ReadResult Qvz_MGTRCB::Read() {
     const bool gui = GuiMode();
     QComboBox* seqLenCombo = gui ? m_pView->SeqLenComboBox() : nullptr;
     Qvz_Attribute* seqLen = block->GetNamedAttribute("CHAN_BOND_SEQ_LEN");
-    if (seqLenCombo) {
-        seqLenCombo->clear();
-        if (seqLen)
-            for (const StringBase& v : seqLen->GetLegalValues().Items())
-                seqLenCombo->addItem(v.ToQString());
-    }
+    Qvz_MGTPageGui::FillComboBox(seqLenCombo, seqLen);
 
     m_allowRepeat = Is(block->GetAttributeValue("CHAN_BOND_ONE_SHOT"), "TRUE") ? 0 : 1;
     if (Qvz_Attribute* use2 = block->GetNamedAttribute("CHAN_BOND_SEQ_2_USE")) {
@@ -348,8 +318,7 @@ bool Qvz_MGTRCB::WriteWizData(bool full) {
         return false;
 
     auto set = [block](const char* name, const StringBase& value) {
-        if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-            a->SetValue(value);
+        SetIfPresent(block, name, value);
     };
     set("QVZ_CHAN_BOND_PRIMARY_ROW", m_primaryRowBottom == 0 ? "1" : "0");
     set("CHAN_BOND_ONE_SHOT", m_allowRepeat != 0 ? "FALSE" : "TRUE");
@@ -360,9 +329,9 @@ bool Qvz_MGTRCB::WriteWizData(bool full) {
     QComboBox* seqLenCombo = GuiMode() ? m_pView->SeqLenComboBox() : nullptr;
     // A list without items (no legal lengths) has no choice to write; the
     // length read stays.
-    set("CHAN_BOND_SEQ_LEN", seqLenCombo && seqLenCombo->currentIndex() >= 0
-                                 ? StringBase::FromQString(seqLenCombo->currentText())
-                                 : m_seqLen);
+    StringBase seqLen = m_seqLen;
+    Qvz_MGTPageGui::ReadComboBox(seqLenCombo, seqLen);
+    set("CHAN_BOND_SEQ_LEN", seqLen);
     WriteBinary(block, "CHAN_BOND_SEQ_1_MASK", m_seq1Mask);
     WriteBinary(block, "CHAN_BOND_SEQ_2_MASK", m_seq2Mask);
     set("CHAN_BOND_SEQ_2_USE", m_seq2Use != 0 ? "TRUE" : "FALSE");

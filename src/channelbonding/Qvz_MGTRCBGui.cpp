@@ -13,24 +13,6 @@ bool Has(const Port::StringBase& s, const char* text) {
     return s.GetIndexOfString(text, Port::CompareSearch) != Port::StringBase::npos;
 }
 
-bool Editable(const Qvz_Attribute* a) {
-    return a && a->IsEditable();
-}
-
-void EnableAll(std::initializer_list<QWidget*> widgets, bool on) {
-    for (QWidget* w : widgets)
-        w->setEnabled(on);
-}
-
-void ShowAll(std::initializer_list<QWidget*> widgets, bool on) {
-    for (QWidget* w : widgets)
-        w->setVisible(on);
-}
-
-Port::StringBase AsciiText(const QLineEdit* edit) {
-    return Port::StringBase(edit->text().toLatin1().toStdString());
-}
-
 } // namespace
 
 Qvz_MGTRCBGui::Qvz_MGTRCBGui(Qvz_MGTRCB* page, QWidget* parent)
@@ -139,13 +121,12 @@ void Qvz_MGTRCBGui::WidgetsToData() {
     Qvz_MGTRCB& p = *m_pPage;
     const Qvz_MGTRCBWidget& f = *m_pForm;
     for (int s = 0; s < Qvz_MGTRCB::kSeqCount; ++s)
-        p.m_seq[s] = AsciiText(SeqEdit(s));
-    p.m_seq1Mask = AsciiText(f.IDC_EDIT_CHAN_BOND_SEQ_1_MASK);
-    p.m_seq2Mask = AsciiText(f.IDC_EDIT_CHAN_BOND_SEQ_2_MASK);
+        p.m_seq[s] = EntryText(SeqEdit(s));
+    p.m_seq1Mask = EntryText(f.IDC_EDIT_CHAN_BOND_SEQ_1_MASK);
+    p.m_seq2Mask = EntryText(f.IDC_EDIT_CHAN_BOND_SEQ_2_MASK);
     // A list without items (a length attribute with no legal values) keeps
     // the length read from the block instead of taking an empty one.
-    if (f.cbSeqLen->currentIndex() >= 0)
-        p.m_seqLen = Port::StringBase::FromQString(f.cbSeqLen->currentText());
+    ReadComboBox(f.cbSeqLen, p.m_seqLen);
     p.m_allowRepeat = f.IDC_CHECK_CHAN_BOND_ONE_SHOT->isChecked() ? 1 : 0;
     p.m_primaryRowBottom = f.IDC_RADIO_PRIMARY_ROW_BOTTOM->isChecked() ? 1 : 0;
     p.m_limit = f.sbCBondLimit->value();
@@ -182,10 +163,10 @@ void Qvz_MGTRCBGui::UpdateControls() {
     // even when the block has no CHAN_BOND_ONE_SHOT.
     const Qvz_Attribute* oneShot = block->GetNamedAttribute("CHAN_BOND_ONE_SHOT");
     f.gbChanBond->setEnabled(bonding);
-    f.IDC_CHECK_CHAN_BOND_ONE_SHOT->setEnabled(bonding && Editable(oneShot));
+    f.IDC_CHECK_CHAN_BOND_ONE_SHOT->setEnabled(bonding && IsEditable(oneShot));
 
     EnableAll({f.IDC_STATIC_CHAN_BOND_LIMIT, f.sbCBondLimit, f.IDC_STATIC_BYTES0},
-              bonding && Editable(block->GetNamedAttribute("CHAN_BOND_LIMIT")));
+              bonding && IsEditable(block->GetNamedAttribute("CHAN_BOND_LIMIT")));
 
     const struct {
         const char* attr;
@@ -196,23 +177,14 @@ void Qvz_MGTRCBGui::UpdateControls() {
         {"CHAN_BOND_SEQ_LEN", f.IDC_STATIC_CHAN_BOND_SEQ_LEN, f.cbSeqLen, f.IDC_STATIC_BYTES3},
     };
     for (const auto& o : optional) {
-        const Qvz_Attribute* a = block->GetNamedAttribute(o.attr);
         // Shown again for the next block that has the attribute.
-        ShowAll({o.label, o.control, o.bytes}, a != nullptr);
-        if (a)
-            EnableAll({o.label, o.control, o.bytes}, bonding && a->IsEditable());
+        ApplyAttrRow(block->GetNamedAttribute(o.attr), bonding, {o.label, o.control, o.bytes});
     }
 
-    const Qvz_Attribute* mask1 = block->GetNamedAttribute("CHAN_BOND_SEQ_1_MASK");
-    ShowAll({f.IDC_STATIC_CHAN_BOND_SEQ_1_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_1_MASK}, mask1 != nullptr);
-    if (mask1)
-        EnableAll({f.IDC_STATIC_CHAN_BOND_SEQ_1_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_1_MASK},
-                  bonding && mask1->IsEditable());
-    const Qvz_Attribute* mask2 = block->GetNamedAttribute("CHAN_BOND_SEQ_2_MASK");
-    ShowAll({f.IDC_STATIC_CHAN_BOND_SEQ_2_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_2_MASK}, mask2 != nullptr);
-    if (mask2)
-        EnableAll({f.IDC_STATIC_CHAN_BOND_SEQ_2_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_2_MASK},
-                  bonding && seq2Use && mask2->IsEditable());
+    ApplyAttrRow(block->GetNamedAttribute("CHAN_BOND_SEQ_1_MASK"), bonding,
+                 {f.IDC_STATIC_CHAN_BOND_SEQ_1_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_1_MASK});
+    ApplyAttrRow(block->GetNamedAttribute("CHAN_BOND_SEQ_2_MASK"), bonding && seq2Use,
+                 {f.IDC_STATIC_CHAN_BOND_SEQ_2_MASK, f.IDC_EDIT_CHAN_BOND_SEQ_2_MASK});
 
     const bool laneIds = Has(name, "Infiniband") && !p.m_isGT11;
     f.IDC_BUTTON_LANE_ID->setVisible(laneIds);
@@ -238,7 +210,7 @@ void Qvz_MGTRCBGui::UpdateControls() {
     use2->setVisible(true);
     // A block without the attribute has no second sequence to switch on.
     use2->setEnabled(custom && bonding &&
-                     Editable(block->GetNamedAttribute("CHAN_BOND_SEQ_2_USE")));
+                     IsEditable(block->GetNamedAttribute("CHAN_BOND_SEQ_2_USE")));
 
     const bool fixedNumber =
         Has(name, "XAUI") ||

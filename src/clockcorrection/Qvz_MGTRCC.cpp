@@ -10,36 +10,10 @@
 
 namespace {
 
-const char* const kDataError = "Tessel Wizard internal data error.";
-
 const char* const kSeq1Names[4] = {"CLK_COR_SEQ_1_1", "CLK_COR_SEQ_1_2", "CLK_COR_SEQ_1_3",
                                    "CLK_COR_SEQ_1_4"};
 const char* const kSeq2Names[4] = {"CLK_COR_SEQ_2_1", "CLK_COR_SEQ_2_2", "CLK_COR_SEQ_2_3",
                                    "CLK_COR_SEQ_2_4"};
-
-// Flags read as true only for "TRUE"; a missing attribute reads as false.
-bool ReadFlag(const Qvz_Block* block, const char* name) {
-    return block->GetAttributeValue(name).Compare("TRUE", Port::CompareExact) == 0;
-}
-
-// Writes value only when the block has the attribute.
-void WriteIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value) {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(value);
-}
-
-const char* BoolText(bool b) {
-    return b ? "TRUE" : "FALSE";
-}
-
-bool IsAllDigits(const Port::StringBase& s) {
-    if (s.IsEmpty())
-        return false;
-    for (char c : s.str())
-        if (!UT_STR::IsDigit(static_cast<unsigned char>(c)))
-            return false;
-    return true;
-}
 
 } // namespace
 
@@ -63,32 +37,6 @@ bool Qvz_MGTRCC::CreateGuiDlg(QWidget* parent) {
 
 Wg_WizardPage* Qvz_MGTRCC::GetGuiDlg() {
     return m_pGui;
-}
-
-Port::StringBase Qvz_MGTRCC::GetBinaryValue(const Qvz_Attribute* attr) {
-    if (!attr)
-        return Port::StringBase();
-    const Port::StringBase& value = attr->GetValue();
-    const std::size_t pos = value.GetIndexOfString("'b", Port::CompareSearch);
-    if (pos == Port::StringBase::npos)
-        return value;
-    // The size says how many trailing digits count. A size that is no number,
-    // or one larger than the digits present, would take part of the size and
-    // marker (or read before the text): keep the digits after the marker.
-    const Port::StringBase digits = value.Mid(pos + 2);
-    const Port::StringBase size = value.Left(pos);
-    if (!IsAllDigits(size))
-        return digits;
-    const int n = UT_STR::AToI(size);
-    if (static_cast<std::size_t>(n) > digits.GetLength())
-        return digits;
-    return value.Right(static_cast<std::size_t>(n));
-}
-
-void Qvz_MGTRCC::SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits) const {
-    if (!attr)
-        return;
-    attr->SetValue(m_isGT11 ? GetSizedLiteral(digits, 0) : digits);
 }
 
 void Qvz_MGTRCC::ReadNumber(Qvz_Block* block, const char* name, Qvz_MGTRCCView::SpinBoxId spin,
@@ -140,12 +88,12 @@ bool Qvz_MGTRCC::ReadWizData() {
         lengths->setCurrentIndex(0);
     }
 
-    m_clkCorrectUse = ReadFlag(block, "CLK_CORRECT_USE");
-    m_keepIdle = ReadFlag(block, "CLK_COR_KEEP_IDLE");
-    m_insertIdleFlag = ReadFlag(block, "CLK_COR_INSERT_IDLE_FLAG");
-    m_seq2Use = ReadFlag(block, "CLK_COR_SEQ_2_USE");
-    m_seqDrop = ReadFlag(block, "CLK_COR_SEQ_DROP");
-    m_8b10bDe = ReadFlag(block, "CLK_COR_8B10B_DE");
+    m_clkCorrectUse = IsTrue(block, "CLK_CORRECT_USE");
+    m_keepIdle = IsTrue(block, "CLK_COR_KEEP_IDLE");
+    m_insertIdleFlag = IsTrue(block, "CLK_COR_INSERT_IDLE_FLAG");
+    m_seq2Use = IsTrue(block, "CLK_COR_SEQ_2_USE");
+    m_seqDrop = IsTrue(block, "CLK_COR_SEQ_DROP");
+    m_8b10bDe = IsTrue(block, "CLK_COR_8B10B_DE");
 
     ReadNumber(block, "CLK_COR_REPEAT_WAIT", Qvz_MGTRCCView::kRepeatWait, m_repeatWait,
                m_repeatWaitValue, m_repeatWaitLow, m_repeatWaitHigh);
@@ -314,28 +262,28 @@ bool Qvz_MGTRCC::WriteWizData() {
         return false;
 
     // Written before the masks are checked, so it stays even when they are refused.
-    WriteIfPresent(block, "CLK_COR_REPEAT_WAIT", m_repeatWait);
+    SetIfPresent(block, "CLK_COR_REPEAT_WAIT", m_repeatWait);
     if (!CheckMasks(block, false))
         return false;
 
-    WriteIfPresent(block, "CLK_CORRECT_USE", BoolText(m_clkCorrectUse != 0));
-    WriteIfPresent(block, "CLK_COR_KEEP_IDLE", BoolText(m_keepIdle != 0));
-    WriteIfPresent(block, "CLK_COR_INSERT_IDLE_FLAG", BoolText(m_insertIdleFlag != 0));
+    SetIfPresent(block, "CLK_CORRECT_USE", BoolText(m_clkCorrectUse != 0));
+    SetIfPresent(block, "CLK_COR_KEEP_IDLE", BoolText(m_keepIdle != 0));
+    SetIfPresent(block, "CLK_COR_INSERT_IDLE_FLAG", BoolText(m_insertIdleFlag != 0));
     // Clock correction needs the receive buffer.
     if (Qvz_Attribute* buffer = block->GetNamedAttribute("RX_BUFFER_USE"))
         if (buffer->GetValue().Compare("FALSE", Port::CompareExact) == 0)
             buffer->SetValue("TRUE");
-    WriteIfPresent(block, "CLK_COR_SEQ_LEN", m_seqLength);
-    WriteIfPresent(block, "CLK_COR_SEQ_2_USE", BoolText(m_seq2Use == 1));
+    SetIfPresent(block, "CLK_COR_SEQ_LEN", m_seqLength);
+    SetIfPresent(block, "CLK_COR_SEQ_2_USE", BoolText(m_seq2Use == 1));
     for (int i = 0; i < 4; ++i)
-        SetBinaryValue(block->GetNamedAttribute(kSeq1Names[i]), m_seq1[i]);
+        SetBinaryValue(block->GetNamedAttribute(kSeq1Names[i]), m_seq1[i], m_isGT11);
     for (int i = 0; i < 4; ++i)
-        SetBinaryValue(block->GetNamedAttribute(kSeq2Names[i]), m_seq2[i]);
-    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_1_MASK"), m_seq1Mask);
-    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_2_MASK"), m_seq2Mask);
-    WriteIfPresent(block, "CLK_COR_MIN_LAT", m_minLat);
-    WriteIfPresent(block, "CLK_COR_MAX_LAT", m_maxLat);
-    WriteIfPresent(block, "CLK_COR_SEQ_DROP", BoolText(m_seqDrop != 0));
-    WriteIfPresent(block, "CLK_COR_8B10B_DE", BoolText(m_8b10bDe != 0));
+        SetBinaryValue(block->GetNamedAttribute(kSeq2Names[i]), m_seq2[i], m_isGT11);
+    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_1_MASK"), m_seq1Mask, m_isGT11);
+    SetBinaryValue(block->GetNamedAttribute("CLK_COR_SEQ_2_MASK"), m_seq2Mask, m_isGT11);
+    SetIfPresent(block, "CLK_COR_MIN_LAT", m_minLat);
+    SetIfPresent(block, "CLK_COR_MAX_LAT", m_maxLat);
+    SetIfPresent(block, "CLK_COR_SEQ_DROP", BoolText(m_seqDrop != 0));
+    SetIfPresent(block, "CLK_COR_8B10B_DE", BoolText(m_8b10bDe != 0));
     return true;
 }

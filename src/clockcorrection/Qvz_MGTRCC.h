@@ -45,12 +45,6 @@ public:
     // otherwise (writing) refuses them.
     bool CheckMasks(Qvz_Block* block, bool useDefaults);
 
-    // The digits of a binary attribute value: a sized literal "N'b..." keeps
-    // its last N digits; anything else is returned as it is.
-    static Port::StringBase GetBinaryValue(const Qvz_Attribute* attr);
-    // Writes digits, as a sized binary literal on GT11 and bare elsewhere.
-    void SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits) const;
-
     // The controller that shows this page; the page does not own it.
     void SetView(Qvz_MGTRCCView* view) { m_pView = view; }
 

@@ -17,17 +17,6 @@ void EnableByAttribute(const Qvz_Attribute* attr, QWidget* label, QWidget* contr
     control->setEnabled(on);
 }
 
-// Check boxes of optional attributes: offered only when the block has one.
-void ShowByAttribute(const Qvz_Attribute* attr, QWidget* box) {
-    box->setVisible(attr != nullptr);
-    if (attr)
-        box->setEnabled(attr->IsEditable());
-}
-
-Port::StringBase AsciiText(const QLineEdit* edit) {
-    return Port::StringBase(edit->text().toLatin1().toStdString());
-}
-
 } // namespace
 
 Qvz_MGTRCCGui::Qvz_MGTRCCGui(Qvz_MGTRCC* page, QWidget* parent)
@@ -85,13 +74,7 @@ QSpinBox* Qvz_MGTRCCGui::LatencySpinBox(SpinBoxId which) {
 }
 
 void Qvz_MGTRCCGui::InitDataMembers(Qvz_Block* block) {
-    QComboBox* lengths = m_pForm->cbSeqLen;
-    lengths->clear();
-    if (!block)
-        return;
-    if (const Qvz_Attribute* a = block->GetNamedAttribute("CLK_COR_SEQ_LEN"))
-        for (const Port::StringBase& v : a->GetLegalValues().Items())
-            lengths->addItem(v.ToQString());
+    FillComboBox(m_pForm->cbSeqLen, block ? block->GetNamedAttribute("CLK_COR_SEQ_LEN") : nullptr);
 }
 
 void Qvz_MGTRCCGui::DataToWidgets() {
@@ -129,15 +112,14 @@ void Qvz_MGTRCCGui::WidgetsToData() {
     p.m_insertIdleFlag = f.cbInsertIdleFlag->isChecked() ? 1 : 0;
     p.m_seq2Use = f.IDC_CHECK_CLK_COR_SEQ_2_USE->isChecked() ? 1 : 0;
     for (int i = 0; i < 4; ++i) {
-        p.m_seq1[i] = AsciiText(SeqEdit(i));
-        p.m_seq2[i] = AsciiText(SeqEdit(4 + i));
+        p.m_seq1[i] = EntryText(SeqEdit(i));
+        p.m_seq2[i] = EntryText(SeqEdit(4 + i));
     }
     // A list without items (a length attribute with no legal values) keeps
     // the length read from the block instead of writing an empty one.
-    if (f.cbSeqLen->currentIndex() >= 0)
-        p.m_seqLength = Port::StringBase::FromQString(f.cbSeqLen->currentText());
-    p.m_seq1Mask = AsciiText(f.IDC_EDIT_CLK_COR_SEQ_1_MASK);
-    p.m_seq2Mask = AsciiText(f.IDC_EDIT_CLK_COR_SEQ_2_MASK);
+    ReadComboBox(f.cbSeqLen, p.m_seqLength);
+    p.m_seq1Mask = EntryText(f.IDC_EDIT_CLK_COR_SEQ_1_MASK);
+    p.m_seq2Mask = EntryText(f.IDC_EDIT_CLK_COR_SEQ_2_MASK);
     p.m_minLatValue = f.sbMin->value();
     p.m_minLat.Format("%d", p.m_minLatValue);
     p.m_maxLatValue = f.sbMax->value();
@@ -166,9 +148,9 @@ void Qvz_MGTRCCGui::UpdateControls() {
 
     // A box hidden for one block must come back for the next one that has
     // the attribute, so presence shows the box as well as enabling it.
-    ShowByAttribute(block->GetNamedAttribute("CLK_CORRECT_USE"), f.cbEnable);
-    ShowByAttribute(block->GetNamedAttribute("CLK_COR_KEEP_IDLE"), f.cbKeepIdle);
-    ShowByAttribute(block->GetNamedAttribute("CLK_COR_INSERT_IDLE_FLAG"), f.cbInsertIdleFlag);
+    ApplyAttrRow(block->GetNamedAttribute("CLK_CORRECT_USE"), true, {f.cbEnable});
+    ApplyAttrRow(block->GetNamedAttribute("CLK_COR_KEEP_IDLE"), true, {f.cbKeepIdle});
+    ApplyAttrRow(block->GetNamedAttribute("CLK_COR_INSERT_IDLE_FLAG"), true, {f.cbInsertIdleFlag});
 
     f.IDC_STATIC_CLK_COR_REPEAT_WAIT->setVisible(firstFamily);
     f.sbRepeatWait->setVisible(firstFamily);
@@ -201,8 +183,8 @@ void Qvz_MGTRCCGui::UpdateControls() {
     if (length8)
         f.IDC_CHECK_CLK_COR_SEQ_2_USE->setVisible(false);
     else
-        ShowByAttribute(block->GetNamedAttribute("CLK_COR_SEQ_2_USE"),
-                        f.IDC_CHECK_CLK_COR_SEQ_2_USE);
+        ApplyAttrRow(block->GetNamedAttribute("CLK_COR_SEQ_2_USE"), true,
+                     {f.IDC_CHECK_CLK_COR_SEQ_2_USE});
 
     QWidget* const masks[5] = {f.gbMask, f.IDC_STATIC_CLK_COR_SEQ_1_MASK,
                                f.IDC_EDIT_CLK_COR_SEQ_1_MASK, f.IDC_STATIC_CLK_COR_SEQ_2_MASK,
@@ -236,8 +218,10 @@ void Qvz_MGTRCCGui::UpdateControls() {
         f.IDC_CHECK_CLK_COR_SEQ_DROP->setVisible(false);
         f.IDC_CHECK_CLK_COR_8B10B_DE->setVisible(false);
     } else {
-        ShowByAttribute(block->GetNamedAttribute("CLK_COR_SEQ_DROP"), f.IDC_CHECK_CLK_COR_SEQ_DROP);
-        ShowByAttribute(block->GetNamedAttribute("CLK_COR_8B10B_DE"), f.IDC_CHECK_CLK_COR_8B10B_DE);
+        ApplyAttrRow(block->GetNamedAttribute("CLK_COR_SEQ_DROP"), true,
+                     {f.IDC_CHECK_CLK_COR_SEQ_DROP});
+        ApplyAttrRow(block->GetNamedAttribute("CLK_COR_8B10B_DE"), true,
+                     {f.IDC_CHECK_CLK_COR_8B10B_DE});
     }
 }
 

@@ -13,25 +13,10 @@
 
 namespace {
 
-const char* const kDataError = "Tessel Wizard internal data error.";
-
 // Digit counts of the GT11 notation: 32-bit patterns and the 10-bit mask.
 constexpr std::size_t kGT11PatternDigits = 8;
 constexpr std::size_t kGT11TenBitDigits = 3;
 constexpr std::size_t kBinaryDigits = 10;
-
-bool IsTrue(const Qvz_Block* block, const char* name) {
-    return block->GetAttributeValue(name).Compare("TRUE", Port::CompareExact) == 0;
-}
-
-const char* BoolText(bool b) {
-    return b ? "TRUE" : "FALSE";
-}
-
-void SetIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value) {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(value);
-}
 
 bool IsHexText(const Port::StringBase& text) {
     return std::all_of(text.str().begin(), text.str().end(),

@@ -24,30 +24,6 @@ const EntryPatterns kEntries[Qvz_MGTRCDGui::kEntryCount] = {
      "Please enter a valid 10-bit binary value for Comma Mask"},
 };
 
-bool IsTrue(const Qvz_Block* block, const char* name) {
-    return block->GetAttributeValue(name).Compare("TRUE", Port::CompareExact) == 0;
-}
-
-// Present and editable.
-bool Editable(const Qvz_Attribute* attribute) {
-    return attribute && attribute->IsEditable();
-}
-
-void EnableAll(std::initializer_list<QWidget*> widgets, bool enabled) {
-    for (QWidget* w : widgets)
-        w->setEnabled(enabled);
-}
-
-// Without the attribute the row is hidden; with it shown and enabled as said.
-void ShowRow(std::initializer_list<QWidget*> widgets, const Qvz_Attribute* attribute,
-             bool enabled) {
-    for (QWidget* w : widgets) {
-        w->setVisible(attribute != nullptr);
-        if (attribute)
-            w->setEnabled(enabled);
-    }
-}
-
 } // namespace
 
 Qvz_MGTRCDGui::Qvz_MGTRCDGui(Qvz_MGTRCD* page, QWidget* parent)
@@ -150,7 +126,7 @@ void Qvz_MGTRCDGui::UpdateControls() {
         return;
     Qvz_MGTRCDWidget& f = *m_pForm;
     const bool off = m_pPage->m_turnOffComma != 0;
-    const bool bypass = IsTrue(block, "QVZX_ONLY_BYPASS_PCS");
+    const bool bypass = Qvz_MGTWizPage::IsTrue(block, "QVZX_ONLY_BYPASS_PCS");
 
     const struct {
         QWidget* group;
@@ -175,21 +151,22 @@ void Qvz_MGTRCDGui::UpdateControls() {
         // that a greyed group from an earlier block cannot trap its
         // detection choices.
         c.group->setEnabled(!off);
-        EnableAll({c.label, c.msb, c.lsb, c.edit}, Editable(pattern) && !off);
-        c.detectGroup->setEnabled(Editable(block->GetNamedAttribute(c.detect)) && !off);
-        c.decoderBox->setEnabled(Editable(block->GetNamedAttribute(c.decoder)) && !off && !bypass);
+        EnableAll({c.label, c.msb, c.lsb, c.edit}, IsEditable(pattern) && !off);
+        c.detectGroup->setEnabled(IsEditable(block->GetNamedAttribute(c.detect)) && !off);
+        c.decoderBox->setEnabled(IsEditable(block->GetNamedAttribute(c.decoder)) && !off &&
+                                 !bypass);
     }
 
     const Qvz_Attribute* mask = block->GetNamedAttribute("COMMA_10B_MASK");
-    ShowRow({f.IDC_STATIC_COMMA_10B_MASK, f.leCommaMask, f.IDC_STATIC_MSB_COMMA,
-             f.IDC_STATIC_LSB_COMMA},
-            mask, Editable(mask) && !off);
+    ApplyAttrRow(mask, !off,
+                 {f.IDC_STATIC_COMMA_10B_MASK, f.leCommaMask, f.IDC_STATIC_MSB_COMMA,
+                  f.IDC_STATIC_LSB_COMMA});
     const Qvz_Attribute* validOnly = block->GetNamedAttribute("DEC_VALID_COMMA_ONLY");
-    ShowRow({f.cbVComma}, validOnly, Editable(validOnly) && !off && !bypass);
+    ApplyAttrRow(validOnly, !off && !bypass, {f.cbVComma});
     const Qvz_Attribute* msb = block->GetNamedAttribute("ALIGN_COMMA_MSB");
-    ShowRow({f.cbAlignMSB}, msb, Editable(msb) && !off);
+    ApplyAttrRow(msb, !off, {f.cbAlignMSB});
     const Qvz_Attribute* word = block->GetNamedAttribute("ALIGN_COMMA_WORD");
-    ShowRow({f.IDC_STATIC_ALIGN_COMMA_WORD, f.cbAlign}, word, Editable(word) && !off);
+    ApplyAttrRow(word, !off, {f.IDC_STATIC_ALIGN_COMMA_WORD, f.cbAlign});
 
     // The first family numbers its bits the other way round.
     const bool gt = block->SupportsMGT3();

@@ -14,10 +14,6 @@ namespace {
 
 const char* const kInternalDataError = "Tessel Wizard internal data error";
 
-const char* TrueFalse(bool b) {
-    return b ? "TRUE" : "FALSE";
-}
-
 bool Equals(const Port::StringBase& s, const char* text) {
     return s.Compare(text, CompareExact) == 0;
 }
@@ -28,12 +24,6 @@ bool BeginsWith(const Port::StringBase& s, const char* text) {
 
 bool Contains(const Port::StringBase& s, const char* text) {
     return s.GetIndexOfString(text, CompareSearch) != Port::StringBase::npos;
-}
-
-// Writes only attributes the block already has.
-void AssignIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value) {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(value);
 }
 
 bool Editable(Qvz_Block* block, const char* name) {
@@ -333,10 +323,10 @@ bool Qvz_MGTGeneralSetup::WriteWizData() {
     }
     block->SetIsUsed(true);
 
-    AssignIfPresent(block, "PMA_SPEED", m_pmaSpeed);
-    AssignIfPresent(block, "QVZX_ONLY_ENABLE_PMA", TrueFalse(m_enablePma));
-    AssignIfPresent(block, "TXABPMACLKSEL", m_txabPmaClkSel);
-    AssignIfPresent(block, "RXPMACLKSEL", m_rxPmaClkSel);
+    SetIfPresent(block, "PMA_SPEED", m_pmaSpeed);
+    SetIfPresent(block, "QVZX_ONLY_ENABLE_PMA", BoolText(m_enablePma));
+    SetIfPresent(block, "TXABPMACLKSEL", m_txabPmaClkSel);
+    SetIfPresent(block, "RXPMACLKSEL", m_rxPmaClkSel);
 
     // Named before the width is written: a GT name carries the width it had.
     const Port::StringBase primName = Qvz_MGTWizMain::GetBlkPrimName(block);
@@ -354,11 +344,11 @@ bool Qvz_MGTGeneralSetup::WriteWizData() {
         block->SetAttributeValue("QVZ_RX_DATA_WIDTH", m_dataWidth);
         block->SetAttributeValue("QVZ_TX_DATA_WIDTH", m_dataWidth);
     }
-    block->SetAttributeValue("QVZ_BOOL_TX_USE", TrueFalse(m_txUse));
-    block->SetAttributeValue("QVZ_BOOL_RX_USE", TrueFalse(m_rxUse));
-    AssignIfPresent(block, "SERDES_10B", TrueFalse(m_serdes10b));
+    block->SetAttributeValue("QVZ_BOOL_TX_USE", BoolText(m_txUse));
+    block->SetAttributeValue("QVZ_BOOL_RX_USE", BoolText(m_rxUse));
+    SetIfPresent(block, "SERDES_10B", BoolText(m_serdes10b));
     ApplyPcsBypassResets(block);
-    AssignIfPresent(block, "TERMINATION_IMP", m_termination);
+    SetIfPresent(block, "TERMINATION_IMP", m_termination);
 
     if (m_isGT11) {
         if (m_gt11Single) {
@@ -367,12 +357,12 @@ bool Qvz_MGTGeneralSetup::WriteWizData() {
         } else {
             block->AddAttribute("QVZ_GT11_MODE", "DUAL");
         }
-        block->AddAttribute("QVZ_GT11_USE_B", TrueFalse(m_gt11UseB));
+        block->AddAttribute("QVZ_GT11_USE_B", BoolText(m_gt11UseB));
     }
-    AssignIfPresent(block, "REF_CLK_V_SEL", m_refClkVSel);
+    SetIfPresent(block, "REF_CLK_V_SEL", m_refClkVSel);
     if (m_isGT10) {
-        block->AddAttribute("QVZX_ONLY_USE_REFCLK", TrueFalse(m_useRefClk != 0));
-        block->AddAttribute("QVZX_ONLY_USE_BREFCLK", TrueFalse(m_useBRefClk != 0));
+        block->AddAttribute("QVZX_ONLY_USE_REFCLK", BoolText(m_useRefClk != 0));
+        block->AddAttribute("QVZX_ONLY_USE_BREFCLK", BoolText(m_useBRefClk != 0));
         block->AddAttribute("QVZX_ONLY_REFCLK_DYN", m_refClkDyn);
         block->AddAttribute("QVZX_ONLY_REFCLK", m_refClk);
     }
@@ -504,7 +494,7 @@ void Qvz_MGTGeneralSetup::ApplyPcsBypassResets(Qvz_Block* block) {
         {"RX_LOSS_OF_SYNC_FSM", "FALSE"},
     };
     for (const auto& r : resets)
-        AssignIfPresent(block, r.name, r.value);
+        SetIfPresent(block, r.name, r.value);
 }
 
 void Qvz_MGTGeneralSetup::ResetZephineClockCorrection(Qvz_Block* block) {

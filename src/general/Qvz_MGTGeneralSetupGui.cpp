@@ -2,6 +2,7 @@
 
 #include "GeneralSetupWidget.h"
 #include "Qvz_MGTGeneralSetup.h"
+#include "Qvz_MGTPageGui.h"
 #include "Qvz_MGTWizMain.h"
 #include "Qvz_StrArray.h"
 #include "Wg_Wizard.h"
@@ -21,14 +22,6 @@ bool Equals(const Port::StringBase& s, const char* text) {
 
 Port::StringBase TextOf(const QComboBox* combo) {
     return Port::StringBase::FromQString(combo->currentText());
-}
-
-// The list's text, or the field unchanged when the list offers nothing: an
-// empty list must not turn into an empty type, width or speed (an empty
-// width would size the data pins to nothing).
-void TakeComboText(const QComboBox* combo, Port::StringBase& field) {
-    if (combo->currentIndex() >= 0)
-        field = TextOf(combo);
 }
 
 // Switches ifTrue on when condition holds, else its sibling: exclusive radio
@@ -223,9 +216,9 @@ void Qvz_MGTGeneralSetupGui::SaveGUIToPage() {
     Qvz_MGTGeneralSetup& p = *m_pPage;
     const GeneralSetupWidget& f = *m_pForm;
 
-    TakeComboText(f.cbTransceiver, p.m_displayName);
-    TakeComboText(f.cbMGTWidth, p.m_dataWidth);
-    TakeComboText(f.cbPMASpeed, p.m_pmaSpeed);
+    Qvz_MGTPageGui::ReadComboBox(f.cbTransceiver, p.m_displayName);
+    Qvz_MGTPageGui::ReadComboBox(f.cbMGTWidth, p.m_dataWidth);
+    Qvz_MGTPageGui::ReadComboBox(f.cbPMASpeed, p.m_pmaSpeed);
     p.m_txUse = f.cbTX->isChecked();
     p.m_rxUse = f.cbRX->isChecked();
     p.m_refClkVSel = f.rbUseBREFCLK->isChecked() ? "1" : "0";

@@ -12,22 +12,8 @@
 
 namespace {
 
-bool IsTrue(const Port::StringBase& value) {
-    return value.Compare("TRUE", Port::CompareExact) == 0;
-}
-
 bool Is(const Port::StringBase& value, const char* text) {
     return value.Compare(text, Port::CompareExact) == 0;
-}
-
-const char* BoolText(bool b) {
-    return b ? "TRUE" : "FALSE";
-}
-
-// Writes value into the block's attribute of that name; a missing attribute stays missing.
-void SetIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value) {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(value);
 }
 
 } // namespace
@@ -97,7 +83,7 @@ bool Qvz_MGTRX::ReadWizData() {
     m_isBatch = m_pWizMain ? m_pWizMain->m_batchMode : true;
     Qvz_Block* block = m_pWizData->GetActiveBlock();
     if (!block) {
-        IssueMessage("Tessel Wizard internal data error.", false, false, false);
+        IssueMessage(kDataError, false, false, false);
         return false;
     }
 

@@ -12,16 +12,6 @@
 
 namespace {
 
-const char* const kDataError = "Tessel Wizard internal data error.";
-
-bool IsTrue(const Port::StringBase& value) {
-    return value.Compare("TRUE", Port::CompareExact) == 0;
-}
-
-const char* BoolText(bool b) {
-    return b ? "TRUE" : "FALSE";
-}
-
 // Decimal text as a whole (blanks, sign, digits, nothing after); text that
 // is no number cannot be a slider position.
 bool IsWholeDecimal(const Port::StringBase& text) {
@@ -35,11 +25,6 @@ bool IsWholeDecimal(const Port::StringBase& text) {
     while (i < s.size() && UT_STR::IsDigit(static_cast<unsigned char>(s[i])))
         ++i;
     return i > digits && i == s.size();
-}
-
-void SetIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value) {
-    if (Qvz_Attribute* a = block->GetNamedAttribute(name))
-        a->SetValue(value);
 }
 
 } // namespace

@@ -141,3 +141,21 @@ void Qvz_MGTPageGui::ApplyAttrRow(const Qvz_Attribute* attr, bool on,
             w->setEnabled(on && attr->IsEditable());
     }
 }
+
+void Qvz_MGTPageGui::EnableAll(std::initializer_list<QWidget*> widgets, bool on) {
+    for (QWidget* w : widgets)
+        w->setEnabled(on);
+}
+
+void Qvz_MGTPageGui::ShowAll(std::initializer_list<QWidget*> widgets, bool on) {
+    for (QWidget* w : widgets)
+        w->setVisible(on);
+}
+
+Port::StringBase Qvz_MGTPageGui::EntryText(const QLineEdit* edit) {
+    return Port::StringBase(edit->text().toLatin1().toStdString());
+}
+
+bool Qvz_MGTPageGui::IsEditable(const Qvz_Attribute* attr) {
+    return attr && attr->IsEditable();
+}

@@ -94,6 +94,13 @@ public:
     void onMoreInfo() override;
     void init() override {}
 
+    // Clears combo and fills it with the attribute's legal values in order;
+    // a null attribute leaves it empty.
+    static void FillComboBox(QComboBox* combo, const Qvz_Attribute* attribute);
+    // field <- combo's current text; left as it is when the list offers
+    // nothing, so that an empty list never blanks an attribute.
+    static void ReadComboBox(const QComboBox* combo, Port::StringBase& field);
+
     int EntryCount() const { return static_cast<int>(m_entries.size()); }
     const LEValidator& Entry(int index) const;
     bool IsActive() const { return m_active; }
@@ -120,12 +127,6 @@ protected:
     // the focus; false then. Entries hidden in the form are passed over: the
     // user could neither see the message's entry nor correct it.
     bool CheckEntries();
-    // Clears combo and fills it with the attribute's legal values in order;
-    // a null attribute leaves it empty.
-    static void FillComboBox(QComboBox* combo, const Qvz_Attribute* attribute);
-    // field <- combo's current text; left as it is when the list offers
-    // nothing, so that an empty list never blanks an attribute.
-    static void ReadComboBox(const QComboBox* combo, Port::StringBase& field);
     // The active block of the page's design data, or null.
     Qvz_Block* ActiveBlock() const;
     void EnableMoreInfo();
@@ -134,6 +135,12 @@ protected:
     // and enabled when on and attr is editable. Null widgets are skipped.
     static void ApplyAttrRow(const Qvz_Attribute* attr, bool on,
                              std::initializer_list<QWidget*> widgets);
+    // Present and editable.
+    static bool IsEditable(const Qvz_Attribute* attr);
+    static void EnableAll(std::initializer_list<QWidget*> widgets, bool on);
+    static void ShowAll(std::initializer_list<QWidget*> widgets, bool on);
+    // An entry's text as attribute text; the validators admit ASCII only.
+    static Port::StringBase EntryText(const QLineEdit* edit);
 
     std::vector<LEValidator> m_entries;
     Qvz_MGTWizPage* m_pBasePage = nullptr;

@@ -53,6 +53,55 @@ bool Qvz_MGTWizPage::GetGT10EncodingChoices(Qvz_Block* block, bool& allowNone, b
     return unchanged;
 }
 
+bool Qvz_MGTWizPage::IsTrue(const Port::StringBase& value) {
+    return value.Compare("TRUE", Port::CompareExact) == 0;
+}
+
+bool Qvz_MGTWizPage::IsTrue(const Qvz_Block* block, const char* name) {
+    return block && IsTrue(block->GetAttributeValue(name));
+}
+
+void Qvz_MGTWizPage::SetIfPresent(Qvz_Block* block, const char* name,
+                                  const Port::StringBase& value) {
+    if (Qvz_Attribute* a = block ? block->GetNamedAttribute(name) : nullptr)
+        a->SetValue(value);
+}
+
+bool Qvz_MGTWizPage::IsAllDigits(const Port::StringBase& s) {
+    if (s.IsEmpty())
+        return false;
+    for (char c : s.str())
+        if (!UT_STR::IsDigit(static_cast<unsigned char>(c)))
+            return false;
+    return true;
+}
+
+Port::StringBase Qvz_MGTWizPage::GetBinaryValue(const Qvz_Attribute* attr) {
+    if (!attr)
+        return Port::StringBase();
+    const Port::StringBase& value = attr->GetValue();
+    const std::size_t pos = value.GetIndexOfString("'b", Port::CompareSearch);
+    if (pos == Port::StringBase::npos)
+        return value;
+    // The size says how many trailing digits count. A size that is no number,
+    // or one larger than the digits present, would take part of the size and
+    // marker (or read before the text): keep the digits after the marker.
+    const Port::StringBase digits = value.Mid(pos + 2);
+    const Port::StringBase size = value.Left(pos);
+    if (!IsAllDigits(size))
+        return digits;
+    const int n = UT_STR::AToI(size);
+    if (static_cast<std::size_t>(n) > digits.GetLength())
+        return digits;
+    return value.Right(static_cast<std::size_t>(n));
+}
+
+void Qvz_MGTWizPage::SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits,
+                                    bool sized) {
+    if (attr)
+        attr->SetValue(sized ? GetSizedLiteral(digits, 0) : digits);
+}
+
 bool Qvz_MGTWizPage::FinishGuiCreation(bool created) {
     if (created)
         return true;

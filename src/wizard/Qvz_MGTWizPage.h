@@ -25,6 +25,24 @@ public:
     static bool GetGT10EncodingChoices(Qvz_Block* block, bool& allowNone, bool& allow8B10B,
                                        bool& allow64B66B);
 
+    // What the pages say when they have no design data to work on.
+    static constexpr const char* kDataError = "Tessel Wizard internal data error.";
+    static const char* BoolText(bool b) { return b ? "TRUE" : "FALSE"; }
+    // Flags read as true only for "TRUE"; a missing attribute reads as false.
+    static bool IsTrue(const Port::StringBase& value);
+    static bool IsTrue(const Qvz_Block* block, const char* name);
+    // Writes value only when the block has the attribute.
+    static void SetIfPresent(Qvz_Block* block, const char* name, const Port::StringBase& value);
+
+    // True when s is not empty and holds decimal digits only.
+    static bool IsAllDigits(const Port::StringBase& s);
+    // The digits of a binary attribute value: a sized literal "N'b..." keeps
+    // its last N digits; anything else is returned as it is. Empty for null.
+    static Port::StringBase GetBinaryValue(const Qvz_Attribute* attr);
+    // Writes digits, as a sized binary literal when sized (GT11) and bare
+    // otherwise; a null attribute is left alone.
+    static void SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits, bool sized);
+
 protected:
     // Shared step of every page's CreateGuiDlg once the controller exists (or not).
     bool FinishGuiCreation(bool created);

@@ -3,6 +3,7 @@
 // answer modal dialogs from inside their own event loops.
 
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTRCB.h"
 #include "Qvz_MGTRCBGui.h"
@@ -21,18 +22,8 @@
 #include <string>
 #include <vector>
 
-struct RcbRecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
-
 inline Qvz_WizData LoadRcbFixture(const char* name) {
-    TestApp();
-    Qvz_WizData d;
-    QString err;
-    EXPECT_TRUE(Qvz_DesignJson::LoadFile(TestData(QString("channelbonding/") + name), d, err))
-        << err.toStdString();
-    return d;
+    return LoadFixtureFile(QString("channelbonding/") + name);
 }
 
 // Makes blockName the only active block.
@@ -43,51 +34,23 @@ inline void Activate(Qvz_WizData& d, const char* blockName) {
     b->SetIsUsed(true);
 }
 
-struct RcbGui {
-    RcbGui(const char* fixture, const char* blockName = nullptr) : data(LoadRcbFixture(fixture)) {
-        if (blockName)
-            Activate(data, blockName);
-        main.SetWizData(&data);
-        main.SetRunMode(Qvz_RunMode::Window);
-        main.SetMessageSink(&sink);
-        main.SetHelpHandler(&help);
-        main.Prepare();
-        page = static_cast<Qvz_MGTRCB*>(main.GetPage(Qvz_MGTWizMain::kChannelBonding));
-        EXPECT_TRUE(page->CreateGuiDlg(&parent));
-        gui = static_cast<Qvz_MGTRCBGui*>(page->GetGuiDlg());
-    }
+// The fixture with blockName (when given) as its only active block.
+inline Qvz_WizData LoadRcbFixture(const char* name, const char* blockName) {
+    Qvz_WizData d = LoadRcbFixture(name);
+    if (blockName)
+        Activate(d, blockName);
+    return d;
+}
+
+struct RcbGui : PageGuiRig<Qvz_MGTRCB, Qvz_MGTRCBGui> {
+    RcbGui(const char* fixture, const char* blockName = nullptr)
+        : PageGuiRig(LoadRcbFixture(fixture, blockName), Qvz_MGTWizMain::kChannelBonding) {}
 
     // Shows the page as the dialog would.
     RcbGui& Activated() {
         gui->onActive();
         return *this;
     }
-    template <class T = QWidget> T* W(const char* name) {
-        T* w = gui->pageWidget()->findChild<T*>(name);
-        EXPECT_NE(w, nullptr) << name;
-        return w;
-    }
-    bool Shown(const char* name) { return !W(name)->isHidden(); }
-    // Enabled as the user sees it (a disabled group disables its children).
-    bool Enabled(const char* name) { return W(name)->isEnabled(); }
-    std::string Value(const char* name) {
-        const Qvz_Attribute* a = data.GetActiveBlock()->GetNamedAttribute(name);
-        return a ? a->GetValue().str() : "<absent>";
-    }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
-
-    Qvz_WizData data;
-    Qvz_RecordingSink sink;
-    RcbRecordingHelp help;
-    QWidget parent;
-    Qvz_MGTWizMain main{"w", false};
-    Qvz_MGTRCB* page = nullptr;
-    Qvz_MGTRCBGui* gui = nullptr;
 };
 
 // The first visible top-level widget of type T, or null.

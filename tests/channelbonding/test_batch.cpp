@@ -51,18 +51,12 @@ bool BatchRun::HasBlock(const QString& name) const {
 }
 
 BatchRun Batch(const char* fixture, const QStringList& extra = {}) {
-    QTemporaryDir tmp;
-    const QString out = tmp.filePath("out.json");
-    const QString report = tmp.filePath("report.json");
-    QStringList args{"--batch", "-o", out, "--report", report};
-    args += extra;
-    args << TestData(QString("channelbonding/") + fixture);
-    HostResult h = RunHost(args);
+    const BatchOutcome h = RunBatchHost(TestData(QString("channelbonding/") + fixture), extra);
     BatchRun r;
-    r.exitCode = h.exitCode;
-    r.report = ReadJson(report);
-    r.out = ReadJson(out);
-    r.err = h.err.toStdString();
+    r.exitCode = h.host.exitCode;
+    r.report = h.report;
+    r.out = h.output;
+    r.err = h.host.err.toStdString();
     return r;
 }
 

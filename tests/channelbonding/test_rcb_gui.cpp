@@ -44,13 +44,7 @@ const char* const kBondingControls[] = {"IDC_BUTTON_VIEW_PLACEMENT",
 } // namespace
 
 TEST(RcbGui, SlotsInTheirOrder) {
-    const QMetaObject& mo = Qvz_MGTRCBGui::staticMetaObject;
-    std::vector<std::string> names;
-    for (int i = mo.methodOffset(); i < mo.methodCount(); ++i) {
-        const QMetaMethod m = mo.method(i);
-        EXPECT_EQ(m.methodType(), QMetaMethod::Slot) << m.methodSignature().toStdString();
-        names.push_back(m.methodSignature().toStdString());
-    }
+    const std::vector<std::string> names = OwnSlots(Qvz_MGTRCBGui::staticMetaObject);
     const std::vector<std::string> expected = {"onActive()",
                                                "onCancel()",
                                                "onBack()",

@@ -2,6 +2,7 @@
 // slots with the real widgets found by object name.
 
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTRCC.h"
 #include "Qvz_MGTRCCGui.h"
@@ -24,18 +25,8 @@
 
 namespace {
 
-struct RecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
-
 Qvz_WizData LoadFixture(const char* name) {
-    TestApp();
-    Qvz_WizData d;
-    QString err;
-    EXPECT_TRUE(Qvz_DesignJson::LoadFile(TestData(QString("clockcorrection/") + name), d, err))
-        << err.toStdString();
-    return d;
+    return LoadFixtureFile(QString("clockcorrection/") + name);
 }
 
 // Sets (or adds) attributes of the active block.
@@ -62,28 +53,11 @@ const char* const kSeq2Edits[4] = {"IDC_EDIT_CLK_COR_SEQ_2_1", "IDC_EDIT_CLK_COR
 
 // A window-run wizard over data with the clock-correction controller created
 // (not yet activated).
-struct RccGui {
-    explicit RccGui(Qvz_WizData d) : data(std::move(d)) {
-        main.SetWizData(&data);
-        main.SetRunMode(Qvz_RunMode::Window);
-        main.SetMessageSink(&sink);
-        main.SetHelpHandler(&help);
-        main.Prepare();
-        page = static_cast<Qvz_MGTRCC*>(main.GetPage(Qvz_MGTWizMain::kClockCorrection));
-        EXPECT_TRUE(page->CreateGuiDlg(&parent));
-        gui = static_cast<Qvz_MGTRCCGui*>(page->GetGuiDlg());
-    }
+struct RccGui : PageGuiRig<Qvz_MGTRCC, Qvz_MGTRCCGui> {
+    explicit RccGui(Qvz_WizData d) : PageGuiRig(std::move(d), Qvz_MGTWizMain::kClockCorrection) {}
     explicit RccGui(const char* fixture) : RccGui(LoadFixture(fixture)) {}
 
-    template <class T = QWidget> T* W(const char* name) {
-        T* w = gui->pageWidget()->findChild<T*>(name);
-        EXPECT_NE(w, nullptr) << name;
-        return w;
-    }
-    bool Shown(const char* name) { return !W(name)->isHidden(); }
-    bool Enabled(const char* name) { return W(name)->isEnabled(); }
     QString Label(const char* name) { return W<QLabel>(name)->text(); }
-    void SetText(const char* name, const char* text) { W<QLineEdit>(name)->setText(text); }
     // Picks a length in the list as the user would.
     void ChooseLength(const char* length) {
         QComboBox* c = W<QComboBox>("cbSeqLen");
@@ -92,36 +66,12 @@ struct RccGui {
         c->setCurrentIndex(i);
         emit c->textActivated(c->currentText());
     }
-    std::string Value(const char* name) {
-        const Qvz_Attribute* a = data.GetActiveBlock()->GetNamedAttribute(name);
-        return a ? a->GetValue().str() : "<absent>";
-    }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
-
-    Qvz_WizData data;
-    Qvz_RecordingSink sink;
-    RecordingHelp help;
-    QWidget parent;
-    Qvz_MGTWizMain main{"w", false};
-    Qvz_MGTRCC* page = nullptr;
-    Qvz_MGTRCCGui* gui = nullptr;
 };
 
 } // namespace
 
 TEST(RccGui, SlotsInTheirOrder) {
-    const QMetaObject& mo = Qvz_MGTRCCGui::staticMetaObject;
-    std::vector<std::string> names;
-    for (int i = mo.methodOffset(); i < mo.methodCount(); ++i) {
-        const QMetaMethod m = mo.method(i);
-        EXPECT_EQ(m.methodType(), QMetaMethod::Slot) << m.methodSignature().toStdString();
-        names.push_back(m.methodSignature().toStdString());
-    }
+    const std::vector<std::string> names = OwnSlots(Qvz_MGTRCCGui::staticMetaObject);
     const std::vector<std::string> expected = {"onActive()",
                                                "onCancel()",
                                                "onBack()",

@@ -3,6 +3,7 @@
 
 #include "../framework/DialogDriver.h"
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTRCD.h"
 #include "Qvz_MGTRCDGui.h"
@@ -27,46 +28,21 @@
 
 namespace {
 
-struct RecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
-
 Qvz_WizData LoadFixture(const char* name) {
-    Qvz_WizData d;
-    QString err;
-    EXPECT_TRUE(Qvz_DesignJson::LoadFile(TestData(QString("commadetect/") + name), d, err))
-        << err.toStdString();
-    return d;
+    return LoadFixtureFile(QString("commadetect/") + name);
 }
 
 // A window-mode wizard main over data with the comma detect controller
 // created and initialised as the dialog would.
-struct RcdGui {
-    explicit RcdGui(Qvz_WizData d, bool init = true) : data(std::move(d)) {
-        TestApp();
-        main.SetWizData(&data);
-        main.SetRunMode(Qvz_RunMode::Window);
-        main.SetMessageSink(&sink);
-        main.SetHelpHandler(&help);
-        main.Prepare();
-        EXPECT_TRUE(Page()->CreateGuiDlg(&parent));
-        gui = Page()->m_pGui;
+struct RcdGui : PageGuiRig<Qvz_MGTRCD, Qvz_MGTRCDGui> {
+    explicit RcdGui(Qvz_WizData d, bool init = true)
+        : PageGuiRig(std::move(d), Qvz_MGTWizMain::kCommaDetect) {
         if (init)
             gui->init();
     }
     explicit RcdGui(const char* fixture, bool init = true) : RcdGui(LoadFixture(fixture), init) {}
 
-    Qvz_MGTRCD* Page() const {
-        return static_cast<Qvz_MGTRCD*>(main.GetPage(Qvz_MGTWizMain::kCommaDetect));
-    }
-    template <class T> T* W(const char* name) {
-        T* w = gui->pageWidget()->findChild<T*>(name);
-        EXPECT_NE(w, nullptr) << name;
-        return w;
-    }
-    bool Shown(const char* name) { return !W<QWidget>(name)->isHidden(); }
-    bool Enabled(const char* name) { return W<QWidget>(name)->isEnabled(); }
+    Qvz_MGTRCD* Page() const { return page; }
     bool Checked(const char* name) { return W<QAbstractButton>(name)->isChecked(); }
     QString Text(const char* name) {
         QObject* o = W<QObject>(name);
@@ -76,7 +52,6 @@ struct RcdGui {
             return e->text();
         return {};
     }
-    void SetText(const char* name, const char* text) { W<QLineEdit>(name)->setText(text); }
     // Whether the entry's validator takes text as a whole.
     bool Accepts(const char* name, const QString& text) {
         const QValidator* v = W<QLineEdit>(name)->validator();
@@ -86,23 +61,6 @@ struct RcdGui {
         int pos = 0;
         return v->validate(t, pos) == QValidator::Acceptable;
     }
-    std::string Value(const char* name) {
-        Qvz_Attribute* a = data.GetActiveBlock()->GetNamedAttribute(name);
-        return a ? a->GetValue().str() : "<absent>";
-    }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
-
-    Qvz_WizData data;
-    Qvz_RecordingSink sink;
-    RecordingHelp help;
-    Qvz_MGTWizMain main{"w", false};
-    QWidget parent;
-    Qvz_MGTRCDGui* gui = nullptr;
 };
 
 const char* const kCommaControls[] = {
@@ -113,13 +71,7 @@ const char* const kCommaControls[] = {
 } // namespace
 
 TEST(CommaDetectGui, SlotsInTheirOrder) {
-    const QMetaObject& mo = Qvz_MGTRCDGui::staticMetaObject;
-    std::vector<std::string> names;
-    for (int i = mo.methodOffset(); i < mo.methodCount(); ++i) {
-        const QMetaMethod m = mo.method(i);
-        EXPECT_EQ(m.methodType(), QMetaMethod::Slot) << m.methodSignature().toStdString();
-        names.push_back(m.methodSignature().toStdString());
-    }
+    const std::vector<std::string> names = OwnSlots(Qvz_MGTRCDGui::staticMetaObject);
     const std::vector<std::string> expected = {"onActive()",
                                                "onCancel()",
                                                "onBack()",

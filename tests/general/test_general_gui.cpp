@@ -3,6 +3,7 @@
 
 #include "GeneralSetupWidget.h"
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTGeneralSetup.h"
 #include "Qvz_MGTGeneralSetupGui.h"
@@ -28,11 +29,6 @@
 #include <vector>
 
 namespace {
-
-struct RecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
 
 std::vector<std::string> Items(const QComboBox* combo) {
     std::vector<std::string> out;
@@ -88,12 +84,7 @@ struct Session {
         const Qvz_Attribute* a = b ? b->GetNamedAttribute(attr) : nullptr;
         return a ? a->GetValue().str() : "<absent>";
     }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
+    std::vector<std::string> Messages() const { return MessageTexts(sink); }
     // '1' or '0' for pages 1..5.
     std::string LaterPages() const {
         std::string s;

@@ -2,6 +2,7 @@
 // with the real widgets found by object name.
 
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTRX.h"
 #include "Qvz_MGTRXGui.h"
@@ -32,11 +33,6 @@ namespace {
 
 const char* kThresholdMessage = "The value of RX_LOS_THRESHOLD must be at least as big as the "
                                 "value of RX_LOS_INVLID_INCR.";
-
-struct RecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
 
 // A receiver fixture, its first block's primitive replaced when prim is given.
 Qvz_WizData LoadFixture(const char* name, const char* prim = nullptr) {
@@ -131,13 +127,7 @@ Qvz_WizData Edited(const char* fixture, const std::function<void(Qvz_Block&)>& e
 } // namespace
 
 TEST(ReceiverGui, SlotsInTheirOrder) {
-    const QMetaObject& mo = Qvz_MGTRXGui::staticMetaObject;
-    std::vector<std::string> names;
-    for (int i = mo.methodOffset(); i < mo.methodCount(); ++i) {
-        const QMetaMethod m = mo.method(i);
-        EXPECT_EQ(m.methodType(), QMetaMethod::Slot) << m.methodSignature().toStdString();
-        names.push_back(m.methodSignature().toStdString());
-    }
+    const std::vector<std::string> names = OwnSlots(Qvz_MGTRXGui::staticMetaObject);
     const std::vector<std::string> expected = {"onActive()",
                                                "onCancel()",
                                                "onBack()",

@@ -22,28 +22,22 @@ struct BatchRun {
 };
 
 BatchRun Batch(const QString& fixture, const QStringList& sets = {}) {
-    QTemporaryDir tmp;
-    const QString out = tmp.filePath("out.json"), report = tmp.filePath("report.json");
-    QStringList args{"--batch", "-o", out, "--report", report};
+    QStringList extra;
     for (const QString& s : sets)
-        args << "--set" << s;
-    args << TestData("receiver/" + fixture);
+        extra << "--set" << s;
+    const BatchOutcome run = RunBatchHost(TestData("receiver/" + fixture), extra);
     BatchRun r;
-    r.host = RunHost(args);
-    r.written = QFile::exists(out);
-    for (const QJsonValue& b : ReadJson(out)["blocks"].toArray()) {
+    r.host = run.host;
+    r.written = run.written;
+    for (const QJsonValue& b : run.output["blocks"].toArray()) {
         if (!b["used"].toBool())
             continue;
         for (const QJsonValue& a : b["attributes"].toArray())
             r.attrs[a["name"].toString()] = a["value"].toString();
         break;
     }
-    r.report = ReadJson(report);
-    for (const QJsonValue& m : r.report["messages"].toArray()) {
-        r.messages << m["text"].toString();
-        EXPECT_EQ(m["flags"].toArray(), QJsonArray({false, false, false}))
-            << m["text"].toString().toStdString();
-    }
+    r.report = run.report;
+    r.messages = PlainMessages(r.report);
     return r;
 }
 

@@ -3,6 +3,7 @@
 // the page in either mode, and batch runs of the program.
 
 #include "HostRunner.h"
+#include "PageGuiSupport.h"
 #include "Qvz_DesignJson.h"
 #include "Qvz_MGTTransmitter.h"
 #include "Qvz_MGTWizMain.h"
@@ -49,12 +50,7 @@ struct Wizard {
         page = std::make_unique<Qvz_MGTTransmitter>(&main);
     }
     Qvz_MGTTransmitter* Page() const { return page.get(); }
-    std::vector<std::string> Messages() const {
-        std::vector<std::string> out;
-        for (const Qvz_Message& m : sink.messages)
-            out.push_back(m.text.str());
-        return out;
-    }
+    std::vector<std::string> Messages() const { return MessageTexts(sink); }
     Qvz_RecordingSink sink;
     Qvz_MGTWizMain main;
     std::unique_ptr<Qvz_MGTTransmitter> page;
@@ -120,14 +116,14 @@ struct BatchRun {
 // Runs the program in batch mode on doc and collects its output and report.
 inline BatchRun RunBatch(const QJsonObject& doc) {
     QTemporaryDir tmp;
-    const QString in = tmp.filePath("in.json"), out = tmp.filePath("out.json"),
-                  report = tmp.filePath("report.json");
+    const QString in = tmp.filePath("in.json");
     EXPECT_TRUE(WriteAll(in, QJsonDocument(doc).toJson()));
+    const BatchOutcome run = RunBatchHost(in);
     BatchRun r;
     r.input = doc;
-    r.exitCode = RunHost({"--batch", "-o", out, "--report", report, in}).exitCode;
-    r.output = ReadJson(out);
-    r.report = ReadJson(report);
+    r.exitCode = run.host.exitCode;
+    r.output = run.output;
+    r.report = run.report;
     for (const QJsonValue& m : r.report["messages"].toArray())
         r.messages.push_back(m.toObject()["text"].toString().toStdString());
     return r;

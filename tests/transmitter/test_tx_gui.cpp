@@ -1,6 +1,7 @@
 // The transmitter controller and form, driven offscreen through their slots
 // with the real widgets found by object name.
 
+#include "PageGuiSupport.h"
 #include "Qvz_MGTTXWidget.h"
 #include "Qvz_MGTTransmitterGui.h"
 #include "TxTestSupport.h"
@@ -20,11 +21,6 @@
 using namespace txtest;
 
 namespace {
-
-struct RecordingHelp : Qvz_HelpHandler {
-    void Open(const Port::StringBase& key) override { keys.push_back(key.str()); }
-    std::vector<std::string> keys;
-};
 
 // A window-mode wizard over data with the transmitter controller created.
 struct TxGui {
@@ -56,13 +52,7 @@ struct TxGui {
 } // namespace
 
 TEST(TransmitterGui, SlotsInTheirOrder) {
-    const QMetaObject& mo = Qvz_MGTTransmitterGui::staticMetaObject;
-    std::vector<std::string> names;
-    for (int i = mo.methodOffset(); i < mo.methodCount(); ++i) {
-        const QMetaMethod m = mo.method(i);
-        EXPECT_EQ(m.methodType(), QMetaMethod::Slot) << m.methodSignature().toStdString();
-        names.push_back(m.methodSignature().toStdString());
-    }
+    const std::vector<std::string> names = OwnSlots(Qvz_MGTTransmitterGui::staticMetaObject);
     const std::vector<std::string> expected = {
         "onActive()",          "onCancel()",         "onBack()",        "onNext()",
         "onFinish()",          "onMoreInfo()",       "init()",          "OnRadioEncoding()",

@@ -51,6 +51,49 @@ TEST(SeqMask, CountsZerosAgainstTheLength) {
         EXPECT_EQ(Qvz_MGTWizPage::ValidateSeqMask(c.mask, c.len), c.ok) << c.mask << "/" << c.len;
 }
 
+TEST(BinaryValue, DigitsTestAndSizedWrites) {
+    const struct {
+        const char* text;
+        bool digits;
+    } digitCases[] = {{"0123456789", true}, {"", false},   {"12a", false},
+                      {" 12", false},       {"-1", false}, {"7", true}};
+    for (const auto& c : digitCases)
+        EXPECT_EQ(Qvz_MGTWizPage::IsAllDigits(c.text), c.digits) << c.text;
+
+    const struct {
+        const char* digits;
+        bool sized;
+        const char* written;
+    } writeCases[] = {{"0101", true, "4'b0101"}, {"0101", false, "0101"}, {"", true, "0'b"}};
+    for (const auto& c : writeCases) {
+        Qvz_Attribute a("CHAN_BOND_SEQ_1_MASK", "x");
+        Qvz_MGTWizPage::SetBinaryValue(&a, c.digits, c.sized);
+        EXPECT_EQ(a.GetValue(), c.written) << c.digits;
+        // What is written reads back as the same digits.
+        EXPECT_EQ(Qvz_MGTWizPage::GetBinaryValue(&a), c.digits) << c.digits;
+    }
+    Qvz_MGTWizPage::SetBinaryValue(nullptr, "1", true); // no attribute: nothing to write
+}
+
+TEST(AttributeFlags, ReadTrueOnlyAndWriteOnlyPresent) {
+    Qvz_Block b("GT_CUSTOM", "GT_CUSTOM", Qvz_Family::GT);
+    b.AddAttribute("ON", "TRUE");
+    b.AddAttribute("LOWER", "true");
+    b.AddAttribute("OFF", "FALSE");
+    EXPECT_TRUE(Qvz_MGTWizPage::IsTrue(&b, "ON"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "LOWER"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "OFF"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(&b, "MISSING"));
+    EXPECT_FALSE(Qvz_MGTWizPage::IsTrue(nullptr, "ON"));
+
+    Qvz_MGTWizPage::SetIfPresent(&b, "OFF", Qvz_MGTWizPage::BoolText(true));
+    Qvz_MGTWizPage::SetIfPresent(&b, "MISSING", "TRUE");
+    Qvz_MGTWizPage::SetIfPresent(nullptr, "OFF", "FALSE");
+    EXPECT_EQ(b.GetAttributeValue("OFF"), "TRUE");
+    EXPECT_EQ(b.GetNamedAttribute("MISSING"), nullptr);
+    EXPECT_STREQ(Qvz_MGTWizPage::BoolText(false), "FALSE");
+}
+
 namespace {
 
 struct EncodingCase {
