@@ -211,10 +211,10 @@ TEST(WindowRuns, AFullRunWritesWhatTheBatchRunWrites) {
         // Infiniband also hands each copy its LANE_ID.
         {Input("gt10", "Infiniband", "4", {"QVZ_CHAN_BOND_NUMBER=20"}), 19, {}},
         {Input("gt11", "Custom", "4", {"QVZ_GT11_MODE=DUAL", "QVZ_CHAN_BOND_NUMBER=24"}), 23, {}},
-        // OC48 switches the clock-correction and bonding pages off. A window
-        // run skips disabled pages; a batch run runs every page, and the
-        // bonding page's write adds CHAN_BOND_MODE "OFF" to a block that has
-        // none.
+        // OC48 switches the clock-correction and bonding pages off, and the
+        // GT10 pruning deletes its bonding attributes. A window run skips
+        // disabled pages; a batch run runs every page, and the bonding
+        // page's write adds CHAN_BOND_MODE "OFF" back.
         {Input("gt10", "OC48", "4", {}), 0, {{"GT10_OC48_4_INST", "CHAN_BOND_MODE", "OFF"}}},
     };
     QTemporaryDir tmp;
