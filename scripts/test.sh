@@ -9,9 +9,10 @@ if [ "${SANITIZE:-0}" = 1 ]; then
   export ASAN_OPTIONS=${ASAN_OPTIONS:-detect_leaks=1:abort_on_error=0}
   export LSAN_OPTIONS=${LSAN_OPTIONS:-suppressions=$PWD/scripts/lsan.supp:print_suppressions=0}
   export UBSAN_OPTIONS=${UBSAN_OPTIONS:-print_stacktrace=1:halt_on_error=1}
-  bash scripts/build.sh -DVELOMUX_SANITIZE=ON
+  bash scripts/build.sh -DVELOMUX_BUILD_TESTS=ON -DVELOMUX_SANITIZE=ON
 else
-  bash scripts/build.sh
+  # ON again: the main command may have built this tree without the tests.
+  bash scripts/build.sh -DVELOMUX_BUILD_TESTS=ON
 fi
 export QT_QPA_PLATFORM=offscreen
 ctest --test-dir "${BUILD_DIR:-build}" --output-on-failure --timeout 600

@@ -63,9 +63,9 @@ QString Qvz_Summary::ToText(bool brief) const {
     lines << QString("Primitive:     %1 (instance %2)").arg(primitive, instance);
     lines << QString("Type:          %1").arg(type);
     lines << QString("Data width:    %1 byte(s)").arg(dataWidth);
-    if (!brief && !loc.isEmpty())
+    if (!loc.isEmpty())
         lines << QString("Placement:     %1").arg(loc);
-    if (!brief && !role.isEmpty())
+    if (!role.isEmpty())
         lines << QString("Bonding role:  %1").arg(role);
     lines << QString("Ports:         %1").arg(ports.size());
     if (!brief)
@@ -93,13 +93,14 @@ QString Qvz_Summary::ToText(bool brief) const {
     if (!brief && !internals.empty())
         lines << QString("Internal signals: %1")
                      .arg(QStringList(internals.begin(), internals.end()).join(", "));
+    // The copies are few and each becomes an instance of its own in the
+    // generated design, so even the short form names them.
     lines << QString("Bonded copies: %1").arg(copies.size());
-    if (!brief)
-        for (const auto& c : copies) {
-            QStringList parts{c.name, c.loc, c.role};
-            parts.removeAll(QString()); // unplaced copies have no LOC
-            lines << "  " + parts.join(' ');
-        }
+    for (const auto& c : copies) {
+        QStringList parts{c.name, c.loc, c.role};
+        parts.removeAll(QString()); // unplaced copies have no LOC
+        lines << "  " + parts.join(' ');
+    }
     return lines.join('\n') + '\n';
 }
 

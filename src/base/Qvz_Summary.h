@@ -39,7 +39,8 @@ struct Qvz_Summary {
     std::vector<Copy> copies;       // bonded copies of the block
 
     static Qvz_Summary Of(const Qvz_WizData& data);
-    // Multi-line text; brief leaves out the per-pin lists.
+    // Multi-line text; brief leaves out the per-pin lists (ports, ties,
+    // internal pins and signals, unconnected pins).
     QString ToText(bool brief) const;
     // The same, fully, as HTML for the summary page. finished false says the
     // finish routine has not completed, so ports and copies may be missing.

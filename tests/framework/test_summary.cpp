@@ -60,8 +60,14 @@ TEST(Summary, TellsWhatTheDesignDataHoldsForTheHost) {
         EXPECT_TRUE(text.contains(line)) << line << "\n" << text.toStdString();
     EXPECT_FALSE(text.contains("STALE"));
     EXPECT_FALSE(text.contains("OTHER"));
-    // The command line's short form leaves out the lists.
-    EXPECT_FALSE(s.ToText(true).contains("TXDATA_IN"));
+    // The command line's short form leaves out the per-pin lists but keeps
+    // the placement and names the copies.
+    const QString brief = s.ToText(true);
+    EXPECT_FALSE(brief.contains("TXDATA_IN"));
+    EXPECT_FALSE(brief.contains("LOOPBACK"));
+    for (const char* line : {"Placement:     GT10_X5Y1", "Bonding role:  MASTER",
+                             "Bonded copies: 1\n  GT10_CUSTOM_INST2 GT10_X4Y1 SLAVE_1_HOP\n"})
+        EXPECT_TRUE(brief.contains(line)) << line << "\n" << brief.toStdString();
 
     const QString html = s.ToHtml(true);
     EXPECT_TRUE(html.contains("10G &lt;Custom&gt;")) << html.toStdString();
