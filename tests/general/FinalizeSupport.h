@@ -82,8 +82,8 @@ struct FinishBench {
 
     // Pins are given as "NAME", "NAME/DIR", "NAME/DIR/WIDTH" or
     // "NAME/DIR/WIDTH/dw" (the width follows the data width).
-    Qvz_Pin* AddPin(const char* spec) {
-        const QStringList f = QString(spec).split('/');
+    Qvz_Pin* AddPin(const char* pinText) {
+        const QStringList f = QString(pinText).split('/');
         Qvz_Pin* p = block->AddPin(StringBase::FromQString(f[0]),
                                    f.size() > 1 ? StringBase::FromQString(f[1]) : "IN");
         p->SetWidth(f.size() > 2 ? f[2].toInt() : 1);

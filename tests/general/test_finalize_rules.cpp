@@ -15,7 +15,7 @@ using F = Qvz_Family;
 struct RuleCase {
     const char* label;
     F family;
-    // Pin spec (see FinishBench::AddPin). Rule cases use outputs unless they
+    // Pin text (see FinishBench::AddPin). Rule cases use outputs unless they
     // are about inputs: an input left unconnected is grounded at the end,
     // which would hide the difference between "unconnected" and "tie 0".
     const char* pin;
