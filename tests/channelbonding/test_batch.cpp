@@ -179,7 +179,7 @@ TEST(BondingBatch, InvalidMaskOnReadFallsBackToDefaults) {
 
 TEST(BondingBatch, InvalidMaskOnWriteRefuses) {
     // The block's own default mask is too long for its default length.
-    BatchRun r = Batch("gt10.json", {"--type", "Aurora"});
+    BatchRun r = Batch("gt10.json", {"--type", "Amberlane"});
     EXPECT_EQ(r.exitCode, 1) << r.err;
     EXPECT_EQ(r.report.value("failed_page").toString(), "Receiver Channel Bonding Setup");
     ASSERT_EQ(r.Messages().size(), 2) << r.err;

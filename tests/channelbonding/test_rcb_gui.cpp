@@ -335,7 +335,7 @@ TEST(RcbGui, Gt11NamesTheEdgesRightAndLeft) {
 }
 
 TEST(RcbGui, AttributesDecideWhatIsShownAndEditable) {
-    RcbGui g("gui_gt.json", "GT_AURORA_INST"); // number 2, a locked limit, little else
+    RcbGui g("gui_gt.json", "GT_AMBERLANE_INST"); // number 2, a locked limit, little else
     g.Activated();
     for (const char* name :
          {"sbCBondOffset", "IDC_STATIC_CHAN_BOND_OFFSET", "IDC_STATIC_BYTES1", "sbCBondWait",

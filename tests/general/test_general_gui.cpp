@@ -307,7 +307,7 @@ TEST(GeneralSetupGui, TypeListSortedFromOfferedFamilies) {
         {"gui_gt.json", nullptr, {"Custom", "Ethernet", "FibreChannel"}},
         // Never the obsolete or renamed primitives, nor another family's.
         {"gui_gt10.json", nullptr, {"10G Custom", "Ethernet", "OC192", "OC48"}},
-        {"gui_gt11.json", nullptr, {"Aurora", "Custom"}},
+        {"gui_gt11.json", nullptr, {"Amberlane", "Custom"}},
         // The current type is offered even when no offered block carries it.
         {"gui_gt.json", "GT10_CUSTOM", {"10G Custom", "Custom", "Ethernet", "FibreChannel"}},
     };
@@ -513,13 +513,13 @@ TEST(GeneralSetupGui, WidthOnGtAndGt11CustomIsTakenAtNext) {
 
 TEST(GeneralSetupGui, Gt11OtherTypeFollowsTheWidth) {
     Session r("gui_gt11.json");
-    r.Choose("cbTransceiver", "Aurora"); // shown width 2
-    EXPECT_EQ(r.page->m_pBlock, r.data.GetNamedBlock("GT11_AURORA_2_INST"));
+    r.Choose("cbTransceiver", "Amberlane"); // shown width 2
+    EXPECT_EQ(r.page->m_pBlock, r.data.GetNamedBlock("GT11_AMBERLANE_2_INST"));
     EXPECT_TRUE(r.Checked("radioBothMGTs"));
     EXPECT_FALSE(r.Enabled("buttonGrpSingleMGT"));
     EXPECT_TRUE(r.Checked("rbTXGREFCLK"));
     r.Choose("cbMGTWidth", "4");
-    EXPECT_EQ(r.page->m_pBlock, r.data.GetNamedBlock("GT11_AURORA_INST"));
+    EXPECT_EQ(r.page->m_pBlock, r.data.GetNamedBlock("GT11_AMBERLANE_INST"));
     EXPECT_TRUE(r.Checked("rbTXREFCLK"));
     EXPECT_TRUE(r.Checked("rbRXREFCLK2"));
 }
@@ -560,7 +560,7 @@ TEST(GeneralSetupGui, NextEnablesTheLaterPagesOfTheChosenPrimitive) {
         {"gui_gt.json", "Custom", "cbRX", "GT_CUSTOM", "10000", "Transmitter Setup"},
         {"gui_gt11.json", nullptr, "cbRX", "GT11_CUSTOM", "11110", "Transmitter Setup"},
         {"gui_gt11.json", nullptr, nullptr, "GT11_CUSTOM", "10000", "Transmitter Setup"},
-        {"gui_gt11.json", "Aurora", nullptr, "GT11_AURORA_2", "11101", "Transmitter Setup"},
+        {"gui_gt11.json", "Amberlane", nullptr, "GT11_AMBERLANE_2", "11101", "Transmitter Setup"},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(std::string(c.fixture) + " " + (c.type ? c.type : "") + " " +
