@@ -73,12 +73,15 @@ struct BatchWizard {
 
 // A fresh copy of the design data and a wizard over it for each iteration;
 // the previous ones are destroyed here, while the timing is paused, rather
-// than at the end of the timed iteration.
+// than at the end of the timed iteration. They go before the copy is made,
+// so that the allocator settles what they freed while making the copy, not
+// in the first timed allocation after it.
 struct Fresh {
     std::unique_ptr<BatchWizard> run;
     std::unique_ptr<Qvz_WizData> data;
     BatchWizard& Make(const Qvz_WizData& base) {
         run.reset();
+        data.reset();
         data = std::make_unique<Qvz_WizData>(base);
         run = std::make_unique<BatchWizard>(*data);
         return *run;
@@ -255,6 +258,9 @@ Qvz_WizData Scaled(int factor) {
             d.AppendNewSignal(std::move(copy));
         }
     }
+    // Loaded design data has its names indexed (the reader looks every name
+    // up); so does this.
+    (void)d.GetNamedSignal(Port::StringBase());
     return d;
 }
 

@@ -16,7 +16,6 @@
 #include <initializer_list>
 #include <string>
 #include <string_view>
-#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -366,25 +365,19 @@ void ReadRoot(const QJsonObject& root, Qvz_WizData& data) {
         Fail("$.format", "expected \"velomux-design-data\"");
     IntAt(root, "version", "$", 1, 1, 1);
     ReadTarget(root, data.Target());
-    // Names are checked against a set: a lookup in the design data per item
-    // would make reading big designs quadratic.
-    std::unordered_set<std::string> names;
     const QJsonArray blocks = ArrayAt(root, "blocks", "$");
-    names.reserve(std::size_t(blocks.size()));
     for (qsizetype i = 0; i < blocks.size(); ++i) {
         const QString p = QString("$.blocks[%1]").arg(i);
         auto b = ReadBlock(AsObject(blocks.at(i), p), p);
-        if (!names.insert(b->GetName().str()).second)
+        if (data.GetNamedBlock(b->GetName()))
             Fail(p + ".name", "duplicate block name " + Quote(b->GetName().ToQString()));
         data.AppendNewBlock(std::move(b));
     }
-    names.clear();
     const QJsonArray sigs = ArrayAt(root, "signals", "$");
-    names.reserve(std::size_t(sigs.size()));
     for (qsizetype i = 0; i < sigs.size(); ++i) {
         const QString p = QString("$.signals[%1]").arg(i);
         auto s = ReadSignal(AsObject(sigs.at(i), p), p);
-        if (!names.insert(s->GetName().str()).second)
+        if (data.GetNamedSignal(s->GetName()))
             Fail(p + ".name", "duplicate signal name " + Quote(s->GetName().ToQString()));
         data.AppendNewSignal(std::move(s));
     }

@@ -21,31 +21,9 @@ bool ParseWholeInt(const std::string& s, std::size_t begin, std::size_t end, int
 }
 
 template <typename T>
-std::vector<std::unique_ptr<T>> DeepCopy(const std::vector<std::unique_ptr<T>>& src) {
-    std::vector<std::unique_ptr<T>> out;
-    out.reserve(src.size());
-    for (const auto& p : src)
-        out.push_back(std::make_unique<T>(*p));
-    return out;
-}
-
-template <typename T>
 bool SameItems(const std::vector<std::unique_ptr<T>>& a, const std::vector<std::unique_ptr<T>>& b) {
     return std::equal(a.begin(), a.end(), b.begin(), b.end(),
                       [](const auto& x, const auto& y) { return *x == *y; });
-}
-
-template <typename T> T* FindByName(const std::vector<std::unique_ptr<T>>& items, const StringBase& name) {
-    for (const auto& p : items)
-        if (p->GetName() == name)
-            return p.get();
-    return nullptr;
-}
-
-template <typename T> void EraseItem(std::vector<std::unique_ptr<T>>& items, const T* item) {
-    items.erase(std::remove_if(items.begin(), items.end(),
-                               [item](const auto& p) { return p.get() == item; }),
-                items.end());
 }
 
 } // namespace
@@ -100,7 +78,7 @@ bool Qvz_Attribute::GetRangeValues(const StringBase& text, int& low, int& high) 
 }
 
 bool operator==(const Qvz_Attribute& a, const Qvz_Attribute& b) {
-    return a.m_name == b.m_name && a.m_value == b.m_value && a.m_default == b.m_default &&
+    return a.GetName() == b.GetName() && a.m_value == b.m_value && a.m_default == b.m_default &&
            a.m_editable == b.m_editable && a.m_changed == b.m_changed && a.m_legal == b.m_legal;
 }
 
@@ -143,16 +121,16 @@ void Qvz_Pin::AddFlag(const StringBase& flag) {
 }
 
 bool operator==(const Qvz_Pin& a, const Qvz_Pin& b) {
-    return a.m_name == b.m_name && a.m_direction == b.m_direction && a.m_signal == b.m_signal &&
-           a.m_width == b.m_width && a.m_dataWidth == b.m_dataWidth && a.m_used == b.m_used &&
-           a.m_grounded == b.m_grounded && a.m_vcc == b.m_vcc && a.m_flags == b.m_flags &&
-           a.m_attrs == b.m_attrs;
+    return a.GetName() == b.GetName() && a.m_direction == b.m_direction &&
+           a.m_signal == b.m_signal && a.m_width == b.m_width && a.m_dataWidth == b.m_dataWidth &&
+           a.m_used == b.m_used && a.m_grounded == b.m_grounded && a.m_vcc == b.m_vcc &&
+           a.m_flags == b.m_flags && a.m_attrs == b.m_attrs;
 }
 
 // ---------------------------------------------------------------- signal
 
 bool operator==(const Qvz_Signal& a, const Qvz_Signal& b) {
-    return a.m_name == b.m_name && a.m_width == b.m_width && a.m_bus == b.m_bus &&
+    return a.GetName() == b.GetName() && a.m_width == b.m_width && a.m_bus == b.m_bus &&
            a.m_external == b.m_external && a.m_direction == b.m_direction &&
            a.m_const0 == b.m_const0 && a.m_const1 == b.m_const1 && a.m_used == b.m_used &&
            a.m_attrs == b.m_attrs;
@@ -185,14 +163,10 @@ const char* Qvz_FamilyName(Qvz_Family f) {
 }
 
 Qvz_Block::Qvz_Block(const StringBase& name, const StringBase& primitive, Qvz_Family family)
-    : m_name(name), m_primitive(primitive), m_family(family) {}
-
-Qvz_Block::Qvz_Block(const Qvz_Block& other)
-    : m_name(other.m_name), m_primitive(other.m_primitive), m_family(other.m_family),
-      m_used(other.m_used), m_attrs(DeepCopy(other.m_attrs)), m_pins(DeepCopy(other.m_pins)) {}
+    : Qvz_Named(name), m_primitive(primitive), m_family(family) {}
 
 Qvz_Attribute* Qvz_Block::GetNamedAttribute(const StringBase& name) const {
-    return FindByName(m_attrs, name);
+    return m_attrs.Find(name);
 }
 
 StringBase Qvz_Block::GetAttributeValue(const StringBase& name) const {
@@ -209,8 +183,7 @@ Qvz_Attribute* Qvz_Block::AddAttribute(const StringBase& name, const StringBase&
         a->SetValue(value);
         return a;
     }
-    m_attrs.push_back(std::make_unique<Qvz_Attribute>(name, value));
-    return m_attrs.back().get();
+    return m_attrs.Append(std::make_unique<Qvz_Attribute>(name, value));
 }
 
 void Qvz_Block::RemoveAttribute(const StringBase& name) {
@@ -218,34 +191,31 @@ void Qvz_Block::RemoveAttribute(const StringBase& name) {
 }
 
 void Qvz_Block::DeleteAttribute(Qvz_Attribute* attr) {
-    if (attr)
-        EraseItem(m_attrs, attr);
+    m_attrs.Erase(attr);
 }
 
 bool Qvz_Block::HasAttrWPrefix(const StringBase& prefix) const {
-    return std::any_of(m_attrs.begin(), m_attrs.end(), [&](const auto& a) {
+    return std::any_of(m_attrs.All().begin(), m_attrs.All().end(), [&](const auto& a) {
         return a->GetName().GetIndexOfString(prefix, Port::CompareSearch) == 0;
     });
 }
 
 Qvz_Pin* Qvz_Block::GetNamedPin(const StringBase& name) const {
-    return FindByName(m_pins, name);
+    return m_pins.Find(name);
 }
 
 Qvz_Pin* Qvz_Block::AddPin(const StringBase& name, const StringBase& direction) {
     if (Qvz_Pin* p = GetNamedPin(name))
         return p;
-    m_pins.push_back(std::make_unique<Qvz_Pin>(name, direction));
-    return m_pins.back().get();
+    return m_pins.Append(std::make_unique<Qvz_Pin>(name, direction));
 }
 
 void Qvz_Block::DeletePin(Qvz_Pin* pin) {
-    if (pin)
-        EraseItem(m_pins, pin);
+    m_pins.Erase(pin);
 }
 
 void Qvz_Block::ClearAllPinSignals() {
-    for (auto& p : m_pins) {
+    for (const auto& p : m_pins.All()) {
         p->SetSigName(StringBase());
         p->RemoveAllPinSigBitProps();
     }
@@ -254,13 +224,14 @@ void Qvz_Block::ClearAllPinSignals() {
 void Qvz_Block::CopyContentsFrom(const Qvz_Block& other) {
     if (&other == this)
         return;
-    m_attrs = DeepCopy(other.m_attrs);
-    m_pins = DeepCopy(other.m_pins);
+    m_attrs = other.m_attrs;
+    m_pins = other.m_pins;
 }
 
 bool operator==(const Qvz_Block& a, const Qvz_Block& b) {
-    return a.m_name == b.m_name && a.m_primitive == b.m_primitive && a.m_family == b.m_family &&
-           a.m_used == b.m_used && SameItems(a.m_attrs, b.m_attrs) && SameItems(a.m_pins, b.m_pins);
+    return a.GetName() == b.GetName() && a.m_primitive == b.m_primitive &&
+           a.m_family == b.m_family && a.m_used == b.m_used &&
+           SameItems(a.m_attrs.All(), b.m_attrs.All()) && SameItems(a.m_pins.All(), b.m_pins.All());
 }
 
 // ---------------------------------------------------------------- design data
@@ -272,46 +243,29 @@ bool operator==(const Qvz_Target& a, const Qvz_Target& b) {
            a.fileName == b.fileName;
 }
 
-Qvz_WizData::Qvz_WizData(const Qvz_WizData& other)
-    : m_target(other.m_target), m_blocks(DeepCopy(other.m_blocks)),
-      m_signals(DeepCopy(other.m_signals)) {}
-
-Qvz_WizData& Qvz_WizData::operator=(const Qvz_WizData& other) {
-    if (this != &other) {
-        m_target = other.m_target;
-        m_blocks = DeepCopy(other.m_blocks);
-        m_signals = DeepCopy(other.m_signals);
-    }
-    return *this;
-}
-
 Qvz_Block* Qvz_WizData::AddBlock(std::unique_ptr<Qvz_Block> block) {
     if (!block || GetNamedBlock(block->GetName()))
         return nullptr;
-    m_blocks.push_back(std::move(block));
-    return m_blocks.back().get();
+    return m_blocks.Append(std::move(block));
 }
 
 Qvz_Block* Qvz_WizData::AppendNewBlock(std::unique_ptr<Qvz_Block> block) {
-    if (!block)
-        return nullptr;
-    m_blocks.push_back(std::move(block));
-    return m_blocks.back().get();
+    return m_blocks.Append(std::move(block));
 }
 
 Qvz_Block* Qvz_WizData::GetActiveBlock() const {
-    for (const auto& b : m_blocks)
+    for (const auto& b : m_blocks.All())
         if (b->IsUsed())
             return b.get();
     return nullptr;
 }
 
 Qvz_Block* Qvz_WizData::GetNamedBlock(const StringBase& name) const {
-    return FindByName(m_blocks, name);
+    return m_blocks.Find(name);
 }
 
 Qvz_Block* Qvz_WizData::GetPrimitiveBlock(const StringBase& primitive) const {
-    for (const auto& b : m_blocks)
+    for (const auto& b : m_blocks.All())
         if (b->GetPrimitiveName() == primitive)
             return b.get();
     return nullptr;
@@ -326,22 +280,20 @@ Qvz_Block* Qvz_WizData::CopyBlock(const Qvz_Block* block, const StringBase& name
     }
     auto copy = std::make_unique<Qvz_Block>(*block);
     copy->SetName(name);
-    m_blocks.push_back(std::move(copy));
-    return m_blocks.back().get();
+    return m_blocks.Append(std::move(copy));
 }
 
 void Qvz_WizData::DeleteBlock(Qvz_Block* block) {
-    if (block)
-        EraseItem(m_blocks, block);
+    m_blocks.Erase(block);
 }
 
 void Qvz_WizData::SetAllBlksIsActive(bool b) {
-    for (auto& blk : m_blocks)
+    for (const auto& blk : m_blocks.All())
         blk->SetIsUsed(b);
 }
 
 Qvz_Signal* Qvz_WizData::GetNamedSignal(const StringBase& name) const {
-    return FindByName(m_signals, name);
+    return m_signals.Find(name);
 }
 
 Qvz_Signal* Qvz_WizData::AddSignal(const StringBase& name, bool external,
@@ -353,8 +305,7 @@ Qvz_Signal* Qvz_WizData::AddSignal(const StringBase& name, bool external,
     auto s = std::make_unique<Qvz_Signal>(name);
     s->SetIsExternal(external, direction);
     s->SetIsUsed(true);
-    m_signals.push_back(std::move(s));
-    return m_signals.back().get();
+    return m_signals.Append(std::move(s));
 }
 
 Qvz_Signal* Qvz_WizData::AddSignal(const Qvz_Signal& signal) {
@@ -362,28 +313,23 @@ Qvz_Signal* Qvz_WizData::AddSignal(const Qvz_Signal& signal) {
         s->SetIsUsed(true);
         return s;
     }
-    m_signals.push_back(std::make_unique<Qvz_Signal>(signal));
-    return m_signals.back().get();
+    return m_signals.Append(std::make_unique<Qvz_Signal>(signal));
 }
 
 Qvz_Signal* Qvz_WizData::AppendNewSignal(std::unique_ptr<Qvz_Signal> signal) {
-    if (!signal)
-        return nullptr;
-    m_signals.push_back(std::move(signal));
-    return m_signals.back().get();
+    return m_signals.Append(std::move(signal));
 }
 
 void Qvz_WizData::DeleteSignal(Qvz_Signal* signal) {
-    if (signal)
-        EraseItem(m_signals, signal);
+    m_signals.Erase(signal);
 }
 
 void Qvz_WizData::SetAllSigsIsActive(bool b) {
-    for (auto& s : m_signals)
+    for (const auto& s : m_signals.All())
         s->SetIsUsed(b);
 }
 
 bool operator==(const Qvz_WizData& a, const Qvz_WizData& b) {
-    return a.m_target == b.m_target && SameItems(a.m_blocks, b.m_blocks) &&
-           SameItems(a.m_signals, b.m_signals);
+    return a.m_target == b.m_target && SameItems(a.m_blocks.All(), b.m_blocks.All()) &&
+           SameItems(a.m_signals.All(), b.m_signals.All());
 }

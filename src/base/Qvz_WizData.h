@@ -3,6 +3,7 @@
 // attributes and pins, the signals of the design, and the target's facts.
 
 #include "Port_StringBase.h"
+#include "Qvz_NamedList.h"
 #include "Qvz_StrArray.h"
 
 #include <memory>
@@ -38,12 +39,11 @@ private:
     std::vector<Qvz_NameValue> m_items;
 };
 
-class Qvz_Attribute {
+class Qvz_Attribute : public Qvz_Named<Qvz_Attribute> {
 public:
     Qvz_Attribute(const StringBase& name, const StringBase& value)
-        : m_name(name), m_value(value), m_default(value) {}
+        : Qvz_Named(name), m_value(value), m_default(value) {}
 
-    const StringBase& GetName() const { return m_name; }
     const StringBase& GetValue() const { return m_value; }
     void SetValue(const StringBase& v) { m_value = v; }
     const StringBase& GetDefaultValue() const { return m_default; }
@@ -63,7 +63,6 @@ public:
     friend bool operator==(const Qvz_Attribute& a, const Qvz_Attribute& b);
 
 private:
-    StringBase m_name;
     StringBase m_value;
     StringBase m_default;
     bool m_editable = true;
@@ -71,15 +70,14 @@ private:
     Qvz_StrArray m_legal;
 };
 
-class Qvz_Pin {
+class Qvz_Pin : public Qvz_Named<Qvz_Pin> {
 public:
     // Bit maps are pin attributes with this prefix.
     static constexpr const char* kBitMapPrefix = "QVZX_ONLY_PIN_SIG_BIT_";
 
     Qvz_Pin(const StringBase& name, const StringBase& direction)
-        : m_name(name), m_direction(direction) {}
+        : Qvz_Named(name), m_direction(direction) {}
 
-    const StringBase& GetName() const { return m_name; }
     const StringBase& GetDirection() const { return m_direction; }
     void SetDirection(const StringBase& d) { m_direction = d; }
     const StringBase& GetSigName() const { return m_signal; }
@@ -121,7 +119,6 @@ public:
     friend bool operator==(const Qvz_Pin& a, const Qvz_Pin& b);
 
 private:
-    StringBase m_name;
     StringBase m_direction;
     StringBase m_signal;
     int m_width = 1;
@@ -133,15 +130,13 @@ private:
     Qvz_NameValueList m_attrs;
 };
 
-class Qvz_Signal {
+class Qvz_Signal : public Qvz_Named<Qvz_Signal> {
 public:
-    explicit Qvz_Signal(const StringBase& name) : m_name(name) {}
+    explicit Qvz_Signal(const StringBase& name) : Qvz_Named(name) {}
     Qvz_Signal(const Qvz_Signal&) = default;
     Qvz_Signal& operator=(const Qvz_Signal&) = default;
     virtual ~Qvz_Signal() = default;
 
-    const StringBase& GetName() const { return m_name; }
-    void SetName(const StringBase& n) { m_name = n; }
     int GetWidth() const { return m_width; }
     void SetWidth(int w) { m_width = w < 1 ? 1 : w; }
     bool IsBus() const { return m_bus; }
@@ -171,7 +166,6 @@ public:
     friend bool operator==(const Qvz_Signal& a, const Qvz_Signal& b);
 
 private:
-    StringBase m_name;
     int m_width = 1;
     bool m_bus = false;
     bool m_external = false;
@@ -188,14 +182,12 @@ enum class Qvz_Family { Unknown, GT, GT10, GT11 };
 Qvz_Family Qvz_FamilyOfPrimitive(const StringBase& primitive);
 const char* Qvz_FamilyName(Qvz_Family f);
 
-class Qvz_Block {
+class Qvz_Block : public Qvz_Named<Qvz_Block> {
 public:
     Qvz_Block(const StringBase& name, const StringBase& primitive, Qvz_Family family);
-    Qvz_Block(const Qvz_Block& other);
+    Qvz_Block(const Qvz_Block& other) = default;
     Qvz_Block& operator=(const Qvz_Block&) = delete;
 
-    const StringBase& GetName() const { return m_name; }
-    void SetName(const StringBase& n) { m_name = n; }
     const StringBase& GetPrimitiveName() const { return m_primitive; }
     Qvz_Family GetFamily() const { return m_family; }
     bool SupportsMGT3() const { return m_family == Qvz_Family::GT; }
@@ -205,7 +197,9 @@ public:
     void SetIsUsed(bool b) { m_used = b; }
 
     // Attributes, in order.
-    const std::vector<std::unique_ptr<Qvz_Attribute>>& GetAttributes() const { return m_attrs; }
+    const std::vector<std::unique_ptr<Qvz_Attribute>>& GetAttributes() const {
+        return m_attrs.All();
+    }
     Qvz_Attribute* GetNamedAttribute(const StringBase& name) const;
     StringBase GetAttributeValue(const StringBase& name) const;
     // Sets the value, adding the attribute when missing.
@@ -218,7 +212,7 @@ public:
     bool HasAttrWPrefix(const StringBase& prefix) const;
 
     // Pins, in order.
-    const std::vector<std::unique_ptr<Qvz_Pin>>& GetPins() const { return m_pins; }
+    const std::vector<std::unique_ptr<Qvz_Pin>>& GetPins() const { return m_pins.All(); }
     Qvz_Pin* GetNamedPin(const StringBase& name) const;
     // A name the block has already returns that pin unchanged.
     Qvz_Pin* AddPin(const StringBase& name, const StringBase& direction);
@@ -232,12 +226,11 @@ public:
     friend bool operator==(const Qvz_Block& a, const Qvz_Block& b);
 
 private:
-    StringBase m_name;
     StringBase m_primitive;
     Qvz_Family m_family;
     bool m_used = false;
-    std::vector<std::unique_ptr<Qvz_Attribute>> m_attrs;
-    std::vector<std::unique_ptr<Qvz_Pin>> m_pins;
+    Qvz_NamedList<Qvz_Attribute> m_attrs;
+    Qvz_NamedList<Qvz_Pin> m_pins;
 };
 
 // What the host knows of the target device.
@@ -255,19 +248,22 @@ struct Qvz_Target {
 class Qvz_WizData {
 public:
     Qvz_WizData() = default;
-    Qvz_WizData(const Qvz_WizData& other);
-    Qvz_WizData& operator=(const Qvz_WizData& other);
+    Qvz_WizData(const Qvz_WizData& other) = default;
+    Qvz_WizData& operator=(const Qvz_WizData& other) = default;
+    Qvz_WizData(Qvz_WizData&& other) noexcept = default;
+    Qvz_WizData& operator=(Qvz_WizData&& other) noexcept = default;
 
     Qvz_Target& Target() { return m_target; }
     const Qvz_Target& Target() const { return m_target; }
 
     // Blocks, in order. Pointers stay valid until the block is deleted.
-    const std::vector<std::unique_ptr<Qvz_Block>>& GetBlocks() const { return m_blocks; }
+    // Lookups by name take constant time; with names repeated, the first
+    // in order is found.
+    const std::vector<std::unique_ptr<Qvz_Block>>& GetBlocks() const { return m_blocks.All(); }
     // Appends a block; returns it (null when the name exists).
     Qvz_Block* AddBlock(std::unique_ptr<Qvz_Block> block);
-    // Appends without looking the name up, for readers that have already
-    // made sure every name is new (a lookup per item makes big designs
-    // quadratic to read). Returns the block.
+    // Appends without looking the name up, for callers that have made sure
+    // the name is new. Returns the block.
     Qvz_Block* AppendNewBlock(std::unique_ptr<Qvz_Block> block);
     Qvz_Block* GetActiveBlock() const;
     Qvz_Block* GetNamedBlock(const StringBase& name) const;
@@ -279,7 +275,7 @@ public:
     void SetAllBlksIsActive(bool b);
 
     // Signals, in order.
-    const std::vector<std::unique_ptr<Qvz_Signal>>& GetSignals() const { return m_signals; }
+    const std::vector<std::unique_ptr<Qvz_Signal>>& GetSignals() const { return m_signals.All(); }
     Qvz_Signal* GetNamedSignal(const StringBase& name) const;
     // New signals are used; an existing one is marked used and otherwise left alone.
     Qvz_Signal* AddSignal(const StringBase& name, bool external, const StringBase& direction);
@@ -295,6 +291,6 @@ public:
 
 private:
     Qvz_Target m_target;
-    std::vector<std::unique_ptr<Qvz_Block>> m_blocks;
-    std::vector<std::unique_ptr<Qvz_Signal>> m_signals;
+    Qvz_NamedList<Qvz_Block> m_blocks;
+    Qvz_NamedList<Qvz_Signal> m_signals;
 };
