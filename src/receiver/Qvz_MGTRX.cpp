@@ -48,7 +48,7 @@ Wg_WizardPage* Qvz_MGTRX::GetGuiDlg() {
 Port::StringBase Qvz_MGTRX::AfeEqDigits(const Port::StringBase& value) {
     const std::size_t prefixLength = std::char_traits<char>::length(kAfeEqPrefix);
     if (value.GetLength() >= prefixLength)
-        return value.Mid(prefixLength);
+        return TextFrom(value, prefixLength);
     // A shorter value cannot carry the full prefix. Take it as a short binary
     // literal (or bare digits) and widen it to three digits, so that the write
     // still produces a well-formed value; anything else reads as zero.

@@ -93,7 +93,15 @@ Port::StringBase Qvz_MGTWizPage::GetBinaryValue(const Qvz_Attribute* attr) {
     const int n = UT_STR::AToI(size);
     if (static_cast<std::size_t>(n) > digits.GetLength())
         return digits;
-    return value.Right(static_cast<std::size_t>(n));
+    return TextFrom(value, value.GetLength() - static_cast<std::size_t>(n));
+}
+
+Port::StringBase Qvz_MGTWizPage::TextFrom(const Port::StringBase& value, std::size_t pos) {
+    const std::string& s = value.str();
+    // UTF-8 continuation bytes are 10xxxxxx.
+    while (pos < s.size() && (static_cast<unsigned char>(s[pos]) & 0xC0) == 0x80)
+        ++pos;
+    return pos < s.size() ? Port::StringBase(s.substr(pos)) : Port::StringBase();
 }
 
 void Qvz_MGTWizPage::SetBinaryValue(Qvz_Attribute* attr, const Port::StringBase& digits,

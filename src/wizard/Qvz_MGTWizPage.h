@@ -36,6 +36,10 @@ public:
 
     // True when s is not empty and holds decimal digits only.
     static bool IsAllDigits(const Port::StringBase& s);
+    // The text from byte pos on, beginning at a whole character: a cut inside
+    // a multi-byte UTF-8 character would leave a stray byte that no
+    // design-data file can hold. Empty when pos is past the end.
+    static Port::StringBase TextFrom(const Port::StringBase& value, std::size_t pos);
     // The digits of a binary attribute value: a sized literal "N'b..." keeps
     // its last N digits; anything else is returned as it is. Empty for null.
     static Port::StringBase GetBinaryValue(const Qvz_Attribute* attr);

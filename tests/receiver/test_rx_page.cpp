@@ -229,6 +229,12 @@ TEST(RxPage, AfeEqReadsThreeDigitsAndWritesAWellFormedValue) {
         {"3'h7", "000"},
         {"1x", "000"},
         {"'b", "000"},
+        // The prefix's length ends inside a two-byte character: the digits
+        // start after it, or the value written back would not be UTF-8.
+        {"9'b00000\xc3\xa9"
+         "101",
+         "101"},
+        {"9'b0000000\xc3\xa9", "0\xc3\xa9"},
     };
     for (const auto& c : cases) {
         Fixture f({{"RXAFEEQ", c.stored}});

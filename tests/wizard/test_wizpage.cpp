@@ -75,6 +75,47 @@ TEST(BinaryValue, DigitsTestAndSizedWrites) {
     Qvz_MGTWizPage::SetBinaryValue(nullptr, "1", true); // no attribute: nothing to write
 }
 
+// Reading the last N digits, or the text after a prefix, counts bytes; a cut
+// inside a multi-byte character would leave a stray byte in the value that
+// the page writes back, and a design no file can hold.
+TEST(BinaryValue, CutsNeverSplitACharacter) {
+    const struct {
+        const char* value;
+        const char* digits;
+    } reads[] = {
+        {"2'b\xc3\xa9", "\xc3\xa9"},           // the whole character
+        {"1'b\xc3\xa9", ""},                   // its second byte only: nothing
+        {"2'b10\xe2\x82\xac", ""},             // inside a three-byte character
+        {"3'b10\xe2\x82\xac", "\xe2\x82\xac"}, // whole again
+        {"4'b10\xe2\x82\xac", "0\xe2\x82\xac"},
+        {"2'b\xc3\xa9"
+         "1",
+         "1"},
+    };
+    for (const auto& c : reads) {
+        Qvz_Attribute a("RXAFEEQ", c.value);
+        EXPECT_EQ(Qvz_MGTWizPage::GetBinaryValue(&a), c.digits) << c.value;
+    }
+
+    const struct {
+        const char* text;
+        std::size_t pos;
+        const char* rest;
+    } cuts[] = {
+        {"abc", 1, "bc"},
+        {"abc", 3, ""},
+        {"abc", 99, ""},
+        {"\xc3\xa9x", 1, "x"},
+        {"\xc3\xa9x", 0, "\xc3\xa9x"},
+        {"a\xe2\x82\xac", 2, ""},
+        {"a\xe2\x82\xac"
+         "b",
+         3, "b"},
+    };
+    for (const auto& c : cuts)
+        EXPECT_EQ(Qvz_MGTWizPage::TextFrom(c.text, c.pos), c.rest) << c.text << " @" << c.pos;
+}
+
 TEST(AttributeFlags, ReadTrueOnlyAndWriteOnlyPresent) {
     Qvz_Block b("GT_CUSTOM", "GT_CUSTOM", Qvz_Family::GT);
     b.AddAttribute("ON", "TRUE");
