@@ -78,7 +78,8 @@ public:
     const Items& All() const { return m_items; }
     std::size_t Size() const { return m_items.size(); }
 
-    // The first item of that name, or null.
+    // The first item of that name, or null. Not safe to call from two
+    // threads at once: a lookup may (re)build the index.
     T* Find(const Port::StringBase& name) const {
         if (!m_indexed)
             Reindex();
