@@ -28,7 +28,6 @@
 
 namespace {
 
-constexpr int kMaxWidth = 65536;
 constexpr int kMaxBond = 1024;
 
 // Thrown only inside this file, to unwind a validation with its message.
@@ -322,7 +321,7 @@ std::unique_ptr<Qvz_Block> ReadBlock(const QJsonObject& o, const QString& path) 
         if (block->GetNamedPin(pn))
             Fail(p + ".name", "duplicate pin name " + Quote(pn.ToQString()));
         Qvz_Pin* pin = block->AddPin(pn, StringAt(po, "direction", p));
-        pin->SetWidth(IntAt(po, "width", p, 1, 1, kMaxWidth));
+        pin->SetWidth(IntAt(po, "width", p, 1, 1, Qvz_MaxWidth));
         pin->SetSupportsDataWidth(BoolAt(po, "data_width", p, false));
         pin->SetSigName(StringAt(po, "signal", p));
         pin->SetIsGrounded(BoolAt(po, "grounded", p, false));
@@ -342,7 +341,7 @@ std::unique_ptr<Qvz_Signal> ReadSignal(const QJsonObject& o, const QString& path
                "attributes"},
               {"name"});
     auto s = std::make_unique<Qvz_Signal>(StringAt(o, "name", path));
-    s->SetWidth(IntAt(o, "width", path, 1, 1, kMaxWidth));
+    s->SetWidth(IntAt(o, "width", path, 1, 1, Qvz_MaxWidth));
     s->SetIsBus(BoolAt(o, "bus", path, false), s->GetWidth());
     const StringBase dir = StringAt(o, "direction", path);
     if (!(dir.IsEmpty() || dir == "I" || dir == "O" || dir == "B"))

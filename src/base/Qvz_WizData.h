@@ -70,6 +70,10 @@ private:
     Qvz_StrArray m_legal;
 };
 
+// The widest pin or signal that design data can hold: wider ones would be
+// saved to files that no reader takes back.
+constexpr int Qvz_MaxWidth = 65536;
+
 class Qvz_Pin : public Qvz_Named<Qvz_Pin> {
 public:
     // Bit maps are pin attributes with this prefix.

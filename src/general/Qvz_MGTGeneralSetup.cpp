@@ -4,7 +4,6 @@
 #include "Qvz_MGTWizMain.h"
 #include "Wg_Wizard.h"
 
-#include <climits>
 #include <new>
 
 using Port::CompareExact;
@@ -388,9 +387,10 @@ void Qvz_MGTGeneralSetup::SetPinWidths(Qvz_Block* block, const Port::StringBase&
         BeginsWith(primName, "GT11_"))
         return;
     // A width that is missing, not positive or too large for the 8-bit data
-    // pins would give nonsense pins; they keep the widths they have.
+    // pins would give nonsense pins (or ones no design-data file can hold);
+    // they keep the widths they have.
     const int n = UT_STR::AToI(m_dataWidth);
-    if (n <= 0 || n > INT_MAX / 8)
+    if (n <= 0 || n > Qvz_MaxWidth / 8)
         return;
     for (const auto& pin : block->GetPins()) {
         if (!pin->SupportsDataWidth())

@@ -563,7 +563,11 @@ TEST(SetPinWidths, ResizesTheFixedWidthGtPrimitivesOnly) {
         {"GT_FIBRE_CHAN_4", "abc", 40, 5},
         {"GT_FIBRE_CHAN_4", "268435456", 40, 5},
         {"GT_FIBRE_CHAN_4", "99999999999", 40, 5},
-        {"GT_FIBRE_CHAN_4", "268435455", 2147483640, 268435455},
+        // Pins wider than design data can hold would be saved to a file
+        // that no reader takes back.
+        {"GT_FIBRE_CHAN_4", "8193", 40, 5},
+        {"GT_FIBRE_CHAN_4", "165536", 40, 5},
+        {"GT_FIBRE_CHAN_4", "8192", 65536, 8192},
     };
     for (const auto& c : cases) {
         TestPage page(nullptr);
