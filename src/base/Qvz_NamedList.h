@@ -233,13 +233,17 @@ private:
             Reindex();
     }
 
+    // The items stay where they are, so the index holds for them still.
     void TakeFrom(Qvz_NamedList& other) {
         m_items = std::move(other.m_items);
+        m_slots = std::move(other.m_slots);
+        m_count = other.m_count;
+        m_indexed = other.m_indexed;
+        m_repeats = other.m_repeats;
         other.m_items.clear();
         other.Clear();
         for (auto& p : m_items)
             p->m_list = this;
-        m_indexed = false;
     }
 
     void Disown() {
